@@ -1,0 +1,45 @@
+#pragma once
+
+#include <cstddef>
+
+#include "lut/LUT.h"
+
+namespace Orlith::LUT {
+
+// Evaluation of a lattice at any colour. Each function takes a point in input coordinates and finds
+// its lattice position per channel, x_c = (p_c - offset_c) / scale_c, from the table's transform.
+// Everything is single precision unless a comment says otherwise, and no point, NaN and infinities
+// included, leads outside the stored samples; a table without samples gives zeros.
+
+/// The sample below the point on every axis: sample i covers [i, i + 1).
+/// @throws Exception "StepInterpolate: expecting a 3D lut"
+RGB StepInterpolate(const LUT& lut, const RGB& point);
+
+/// Each output channel linear on a grid that is shifted by half a cell along its own axis.
+/// @throws Exception "LinearStaggeredInterpolate: expecting a 3D lut"
+RGB LinearStaggeredInterpolate(const LUT& lut, const RGB& point);
+
+/// The weighted mean of the cell's eight corners. The lower corner is not clamped: do not ask for
+/// points below the domain.
+/// @throws Exception "TrilinearInterpolate: expecting a 3D lut"
+RGB TrilinearInterpolate(const LUT& lut, const RGB& point);
+
+/// Catmull-Rom over the 4 x 4 x 4 neighbourhood, continued linearly beyond the lattice.
+/// @throws Exception "CubicInterpolate: expecting a 3D lut"
+RGB CubicInterpolate(const LUT& lut, const RGB& point);
+
+/// The sample at lattice indices that may lie outside: beyond one face the edge's slope goes on in
+/// a straight line; beyond several, the lines of each axis are blended by how far outside it lies.
+/// @throws Exception "Extrapolate: expecting a 3D lut"
+RGB Extrapolate(const LUT& lut, int r, int g, int b);
+
+/// Looks t in [0, 1] up in one channel of a curve by linear interpolation; clamps outside.
+///
+/// @param entries     the curve; at least one
+/// @param entryCount  entries stored; no element beyond is read
+/// @param channel     0 to 2
+/// @param points      points of the curve on this channel, which may differ from entryCount
+float interpolateCurve(const RGB* entries, std::size_t entryCount, unsigned channel, float points,
+                       float t);
+
+}  // namespace Orlith::LUT

@@ -1,0 +1,62 @@
+#pragma once
+
+#include <boost/smart_ptr/shared_ptr.hpp>
+#include <cstdint>
+#include <string>
+
+#include "lut/LUT.h"
+#include "lut/property/PropertySet.h"
+
+namespace Orlith::LUT {
+
+/// Reads a table from a file; one kind of reader for each format. A reader can be used again.
+/// Binary  the order of the virtual functions is fixed: new ones go last.
+class LUTFileReader {
+public:
+    LUTFileReader() = default;
+    LUTFileReader(const LUTFileReader&) = delete;
+    LUTFileReader& operator=(const LUTFileReader&) = delete;
+    virtual ~LUTFileReader() = default;
+
+    /// Reads the named file into a new table, a LUT1D or a LUT3D.
+    /// @throws Exception          the file cannot be opened or is not what the format says
+    /// @throws std::length_error  the file declares a table that no lattice can hold
+    virtual boost::shared_ptr<LUT> read(const std::string& filename) = 0;
+
+    /// Options of the format. A name that is taken keeps its property; the result says so by false.
+    bool setProperty(const std::string& name, const boost::shared_ptr<Property::Base>& property) {
+        return properties_.insert(name, property);
+    }
+
+    /// The option of that name, or an empty pointer.
+    boost::shared_ptr<Property::Base> getProperty(const std::string& name) const {
+        return properties_.find(name);
+    }
+
+    /// The physical line that was read last, counted from 1: after a failure, the place of it.
+    /// 0 when none was read, and for binary files.
+    std::uint64_t lineNumber() const { return lineNumber_; }
+
+    /// Samples of the table that the file held, surplus ones that overwrote others included.
+    std::uint64_t sampleCount() const { return sampleCount_; }
+
+protected:
+    const Property::PropertySet& properties() const { return properties_; }
+
+    /// Forgets the last read: call first in read.
+    void beginRead() {
+        lineNumber_ = 0;
+        sampleCount_ = 0;
+    }
+
+    boost::shared_ptr<LUT> lut_;  ///< the reader's current table
+
+private:
+    Property::PropertySet properties_;
+
+protected:
+    std::uint64_t lineNumber_ = 0;
+    std::uint64_t sampleCount_ = 0;
+};
+
+}  // namespace Orlith::LUT

@@ -1,0 +1,88 @@
+#include "lut/io/Registry.h"
+
+#include <boost/smart_ptr/make_shared.hpp>
+#include <string_view>
+
+#include "lut/Exception.h"
+#include "lut/io/LUTFileReaderIridas.h"
+#include "lut/io/LUTFileWriterIridas.h"
+
+namespace Orlith::LUT {
+namespace {
+
+/// One extension: how to make its reader or writer, or the text that refuses it.
+template <class Face>
+struct Row {
+    std::string_view extension;
+    boost::shared_ptr<Face> (*make)();
+    const char* refusal;
+};
+
+template <class Face, class Format>
+boost::shared_ptr<Face> make() {
+    return boost::make_shared<Format>();
+}
+
+template <class Format>
+constexpr Row<LUTFileReader> reads(std::string_view extension) {
+    return {extension, make<LUTFileReader, Format>, nullptr};
+}
+
+template <class Format>
+constexpr Row<LUTFileWriter> writes(std::string_view extension) {
+    return {extension, make<LUTFileWriter, Format>, nullptr};
+}
+
+// Tested from the top; the first match decides.
+constexpr Row<LUTFileReader> kReaders[] = {
+    reads<LUTFileReaderIridas>(".cube"),
+    reads<LUTFileReaderIridas>(".itx"),
+    {".icc", nullptr, "reader not found"},
+};
+
+constexpr Row<LUTFileWriter> kWriters[] = {
+    writes<LUTFileWriterIridas>(".cube"),
+    {".icc", nullptr, "writer not found"},
+};
+
+template <class Face, std::size_t kRowCount>
+boost::shared_ptr<Face> create(const Row<Face> (&rows)[kRowCount], const std::string& filename,
+                               bool useGivenExtension, const std::string& givenExtension,
+                               const char* notFound) {
+    std::string extension = givenExtension;
+    if (!useGivenExtension) splitExtension(filename, nullptr, &extension);
+    for (const Row<Face>& row : rows) {
+        if (row.extension != extension) continue;
+        if (row.refusal != nullptr) throw Exception(row.refusal);
+        return row.make();
+    }
+    throw Exception(notFound);
+}
+
+}  // namespace
+
+boost::shared_ptr<LUTFileReader> createReader(const std::string& filename, bool useGivenExtension,
+                                              const std::string& givenExtension) {
+    // Deliberate: the %s stays as it is, here and below; callers show the text unformatted.
+    return create(kReaders, filename, useGivenExtension, givenExtension,
+                  "No reader found for extension \"%s\".");
+}
+
+boost::shared_ptr<LUTFileWriter> createWriter(const std::string& filename, bool useGivenExtension,
+                                              const std::string& givenExtension) {
+    return create(kWriters, filename, useGivenExtension, givenExtension,
+                  "No writer found for extension \"%s\".");
+}
+
+void splitExtension(const std::string& path, std::string* base, std::string* extension) {
+    constexpr std::string_view kFolderEnds = "\\/:";
+    std::size_t split = path.find_last_of(".\\/:");
+    const bool startsExtension = split != std::string::npos && path[split] == '.' && split > 0 &&
+                                 kFolderEnds.find(path[split - 1]) == std::string_view::npos;
+    if (!startsExtension) split = path.size();
+    const std::string whole = path;  // base or extension may be path itself
+    if (base != nullptr) *base = whole.substr(0, split);
+    if (extension != nullptr) *extension = whole.substr(split);
+}
+
+}  // namespace Orlith::LUT

@@ -1,0 +1,52 @@
+#include "lut/io/text/FixedNotation.h"
+
+#include <charconv>
+#include <cmath>
+#include <cstdint>
+#include <cstring>
+
+namespace Orlith::LUT {
+namespace {
+
+/// "00", "01", ... "99".
+struct DigitPairs {
+    char text[200];
+    constexpr DigitPairs() : text() {
+        for (int i = 0; i < 100; ++i) {
+            text[2 * i] = static_cast<char>('0' + i / 10);
+            text[2 * i + 1] = static_cast<char>('0' + i % 10);
+        }
+    }
+};
+constexpr DigitPairs kPairs;
+
+void writePair(char* out, std::uint32_t pair) {
+    std::memcpy(out, kPairs.text + 2 * pair, 2);
+}
+
+}  // namespace
+
+char* writeFixed(char* out, float value) {
+    // A float has 24 significant bits and 10^6 is 2^6 * 5^6, 14 more: their product is exact in
+    // double, so that rounding it to an integer gives the very digits of fixed notation.
+    const double millionths = std::fabs(static_cast<double>(value)) * 1e6;
+    if (!(millionths < 9.0e18)) {  // beyond 64-bit integers, or not finite
+        return std::to_chars(out, out + kFixedLength, value, std::chars_format::fixed, 6).ptr;
+    }
+    if (std::signbit(value)) *out++ = '-';
+    const auto rounded = static_cast<std::uint64_t>(std::nearbyint(millionths));
+    const std::uint64_t whole = rounded / 1000000;
+    const auto fraction = static_cast<std::uint32_t>(rounded % 1000000);
+    if (whole < 10) {
+        *out++ = static_cast<char>('0' + whole);
+    } else {
+        out = std::to_chars(out, out + kFixedLength - 8, whole).ptr;
+    }
+    *out++ = '.';
+    writePair(out, fraction / 10000);
+    writePair(out + 2, fraction / 100 % 100);
+    writePair(out + 4, fraction % 100);
+    return out + 6;
+}
+
+}  // namespace Orlith::LUT

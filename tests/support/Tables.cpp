@@ -1,0 +1,100 @@
+#include "tests/support/Tables.h"
+
+#include <gtest/gtest.h>
+
+#include <boost/smart_ptr/make_shared.hpp>
+#include <cmath>
+#include <stdexcept>
+
+#include "lut/Exception.h"
+#include "lut/io/Registry.h"
+#include "tests/support/Files.h"
+
+namespace test {
+
+ol::RGB markedSample(int r, int g, int b) {
+    const auto place = static_cast<float>(r + 10 * g + 100 * b);
+    return {place / 10000.0F, (place + 1000.0F) / 10000.0F, (place + 2000.0F) / 10000.0F};
+}
+
+boost::shared_ptr<ol::LUT3D> markedLattice(int width, int height, int depth) {
+    auto lut = boost::make_shared<ol::LUT3D>();
+    lut->resize(width, height, depth);
+    for (int b = 0; b < depth; ++b) {
+        for (int g = 0; g < height; ++g) {
+            for (int r = 0; r < width; ++r)
+                lut->get(r, g, b) = markedSample(r, g, b);
+        }
+    }
+    return lut;
+}
+
+boost::shared_ptr<ol::LUT1D> markedCurve(int sampleCount) {
+    auto lut = boost::make_shared<ol::LUT1D>();
+    lut->resize(sampleCount);
+    for (int i = 0; i < sampleCount; ++i)
+        lut->get(i) = markedSample(i, 0, 0);
+    return lut;
+}
+
+void expectRGB(const ol::RGB& actual, float r, float g, float b) {
+    EXPECT_EQ(actual[0], r);
+    EXPECT_EQ(actual[1], g);
+    EXPECT_EQ(actual[2], b);
+}
+
+void expectRGB(const ol::RGB& actual, const ol::RGB& expected) {
+    expectRGB(actual, expected[0], expected[1], expected[2]);
+}
+
+void expectSamplesNear(const ol::LUT& actual, const ol::LUT& expected, float tolerance) {
+    ASSERT_EQ(actual.is1D(), expected.is1D());
+    ASSERT_EQ(actual.width(), expected.width());
+    if (!actual.is1D()) {
+        ASSERT_EQ(actual.height(), expected.height());
+        ASSERT_EQ(actual.depth(), expected.depth());
+    }
+    for (std::size_t i = 0; i < expected.dataSize() / sizeof(float); ++i) {
+        ASSERT_NEAR(actual.data()[i], expected.data()[i], tolerance) << "float " << i;
+    }
+}
+
+std::string messageOf(const std::function<void()>& action) {
+    try {
+        action();
+    } catch (const ol::Exception& exception) {
+        return exception.message();
+    }
+    return "(no exception)";
+}
+
+boost::shared_ptr<ol::LUT> readBytes(const std::string& extension, std::string_view bytes) {
+    const TempFolder folder;
+    return ol::createReader("", true, extension)->read(folder.write("table", bytes));
+}
+
+void expectRefused(const std::string& extension, const std::string& good,
+                   const std::vector<BadFile>& badFiles) {
+    ASSERT_EQ(messageOf([&] { readBytes(extension, good); }), "(no exception)");
+    for (const BadFile& bad : badFiles) {
+        SCOPED_TRACE(bad.name);
+        const std::string bytes = replaced(good, bad.from, bad.to);
+        EXPECT_EQ(messageOf([&] { readBytes(extension, bytes); }), bad.message);
+    }
+}
+
+void expectTruncationsAreSafe(const std::string& extension, const std::string& bytes) {
+    const TempFolder folder;
+    const auto reader = ol::createReader("", true, extension);
+    for (std::size_t byteCount = 0; byteCount < bytes.size(); ++byteCount) {
+        const std::string file = folder.write("cut", std::string_view(bytes).substr(0, byteCount));
+        try {
+            EXPECT_TRUE(reader->read(file)) << "cut to " << byteCount << " bytes";
+        } catch (const ol::Exception& exception) {
+            EXPECT_STRNE(exception.message(), "") << "cut to " << byteCount << " bytes";
+        } catch (const std::length_error&) {
+        }
+    }
+}
+
+}  // namespace test

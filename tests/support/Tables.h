@@ -1,0 +1,56 @@
+#pragma once
+
+#include <boost/smart_ptr/shared_ptr.hpp>
+#include <functional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "lut/LUT1D.h"
+#include "lut/LUT3D.h"
+
+namespace test {
+
+namespace ol = Orlith::LUT;
+
+/// A lattice whose every float tells its place and channel: (r + 10 g + 100 b + 1000 c) / 10000, so
+/// that no swapped axis, transposed loop or exchanged channel goes unseen.
+boost::shared_ptr<ol::LUT3D> markedLattice(int width, int height, int depth);
+
+/// A curve of the same kind: (i + 1000 c) / 10000.
+boost::shared_ptr<ol::LUT1D> markedCurve(int sampleCount);
+
+/// What markedLattice holds at a point.
+ol::RGB markedSample(int r, int g, int b);
+
+/// Expects the floats of a triple, bit for bit.
+void expectRGB(const ol::RGB& actual, float r, float g, float b);
+void expectRGB(const ol::RGB& actual, const ol::RGB& expected);
+
+/// Expects every sample of two tables of the same kind and size to agree within a tolerance.
+void expectSamplesNear(const ol::LUT& actual, const ol::LUT& expected, float tolerance);
+
+/// The message of the Exception that an action throws; "(no exception)" if it throws none.
+std::string messageOf(const std::function<void()>& action);
+
+/// Reads bytes with the reader of an extension.
+boost::shared_ptr<ol::LUT> readBytes(const std::string& extension, std::string_view bytes);
+
+/// A wrong file, made from a good one by replacing a piece, and the message that refuses it.
+struct BadFile {
+    const char* name;
+    const char* from;
+    const char* to;
+    const char* message;
+};
+
+/// Expects the good file to be read and each of the bad ones to be refused with its message.
+void expectRefused(const std::string& extension, const std::string& good,
+                   const std::vector<BadFile>& badFiles);
+
+/// Reads every truncation of a file's bytes, each from a file of just that size. Each has to give a
+/// table, an Exception or the standard library's length error; under the address sanitizer, without
+/// reading or writing outside an array.
+void expectTruncationsAreSafe(const std::string& extension, const std::string& bytes);
+
+}  // namespace test
