@@ -6,6 +6,9 @@
 #include "zefra/Export.h"
 #include "zefra/Op.h"
 
+/// The version of this interface, for build stamps.
+#define ZEFRA_HOST_VERSION "Zefra 1.0"
+
 namespace zefra {
 
 /// Registers an operator class for as long as it lives. A bundle holds one as a static object, so
@@ -37,8 +40,5 @@ private:
     const char* buildStamp_;
     Make make_;
 };
-
-/// The version of this interface, for build stamps.
-constexpr const char* kHostVersion = "Zefra 1.0";
 
 }  // namespace zefra
