@@ -1,0 +1,54 @@
+#pragma once
+
+#include <filesystem>
+#include <memory>
+#include <string>
+
+#include "zefra/Image.h"
+#include "zefra/Iop.h"
+#include "zefra/Row.h"
+
+namespace host {
+
+/// An image file that is read as float red, green and blue.
+///
+/// Rows     counted upward: row 0 is the last line of the file's display window. Columns are those
+///          of the file, so a data window that starts elsewhere gives a box that starts elsewhere.
+/// Channels the three that the file names R, G and B, otherwise its first three.
+/// Memory   12 bytes a pixel, from the first row asked for.
+class ImageFile {
+public:
+    /// Reads what the file says about itself.
+    /// @throws Error  with path and reason
+    explicit ImageFile(std::string path);
+    ~ImageFile();
+
+    const std::string& path() const { return path_; }
+    const zefra::Box& box() const { return box_; }
+
+    /// Whether the file still is what was opened.
+    bool isCurrent() const;
+
+    /// Fills pixels x to r - 1 of row y; those outside the box are black.
+    /// @throws Error  if the file's pixels cannot be read whole
+    void copyRow(int y, int x, int r, zefra::ChannelMask channels, zefra::Row& row);
+
+private:
+    struct Source;  // the open file; gone once its pixels are here
+
+    void readPixels();
+
+    std::string path_;
+    std::filesystem::file_time_type time_;
+    std::uintmax_t byteCount_ = 0;
+    zefra::Box box_;
+    std::unique_ptr<Source> source_;
+    std::unique_ptr<float[]> pixels_;  // r g b; the file's first line first
+};
+
+/// Writes an image row by row: float where the format holds it, otherwise 16-bit integers, or the
+/// most that the format has. A file that could not be written whole is removed.
+/// @throws Error  with path and reason; whatever the image throws
+void writeImage(const std::string& path, zefra::Iop& image);
+
+}  // namespace host
