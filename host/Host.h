@@ -10,6 +10,13 @@
 
 namespace host {
 
+/// Frames first, first + step, ... up to last, which may lie below for a negative step.
+struct FrameRange {
+    int first;
+    int last;
+    int step;
+};
+
 /// The embedded host: the nodes of one script, the bundles that their operators come from, and the
 /// current frame. One thread.
 class Host {
@@ -47,6 +54,11 @@ public:
     /// @throws Error  no such button, or the script's failure. Failures of nodes that it executes
     ///                are those nodes' errors.
     void press(Node& node, const std::string& controlName);
+
+    /// Executes nodes frame by frame. Stops after a frame in which one of them failed, and when the
+    /// user cancels; then the current frame is what it was before.
+    /// @throws Error  a step of 0, or more frames than anybody can mean
+    void executeMultiple(const std::vector<Node*>& nodes, const std::vector<FrameRange>& ranges);
 
     // Stops what is being executed; the first may be called from a signal handler.
     static void requestCancel() noexcept { host::requestCancel(); }

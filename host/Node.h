@@ -52,8 +52,8 @@ public:
     /// @throws Error  no such control, or one without a value
     std::string value(const std::string& name) const;
 
-    /// Takes the values of a saved node over. They are set in the order of the panel, whatever order
-    /// they come in; "name" is the node's own.
+    /// Takes the values of a saved node over. They are set in the order of the panel, whatever
+    /// order they come in; "name" is the node's own.
     /// @throws Error  as setValue; a value without a control; a name that is taken
     void load(const Values& values);
 
