@@ -9,12 +9,12 @@ std::string_view trim(std::string_view text) {
     return text.substr(first, text.find_last_not_of(kSpace) - first + 1);
 }
 
-void Tokens::split(std::string_view line) {
+void Tokens::split(std::string_view line, std::size_t mostWords) {
     tokens_.clear();
     const char* at = line.data();
     const char* const end = at + line.size();
     const auto isSeparator = [](char c) { return c == ' ' || c == '\t'; };
-    for (;;) {
+    while (tokens_.size() < mostWords) {
         while (at != end && isSeparator(*at))
             ++at;
         if (at == end) return;

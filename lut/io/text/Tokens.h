@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstddef>
+#include <limits>
 #include <string_view>
 #include <vector>
 
@@ -17,7 +18,10 @@ public:
     explicit Tokens(std::string_view line) { split(line); }
 
     /// Replaces the words by those of another line, which has to outlive their use.
-    void split(std::string_view line);
+    /// @param mostWords  stop after so many: one more than can be used, where a line may hold
+    ///                   millions that only their count could refuse
+    void split(std::string_view line,
+               std::size_t mostWords = std::numeric_limits<std::size_t>::max());
 
     std::size_t count() const { return tokens_.size(); }
     bool empty() const { return tokens_.empty(); }
