@@ -5,7 +5,9 @@
 
 #include "lut/Exception.h"
 #include "lut/io/LUTFileReaderIridas.h"
+#include "lut/io/LUTFileReaderVF.h"
 #include "lut/io/LUTFileWriterIridas.h"
+#include "lut/io/LUTFileWriterVF.h"
 
 namespace Orlith::LUT {
 namespace {
@@ -33,17 +35,25 @@ constexpr Row<LUTFileWriter> writes(std::string_view extension) {
     return {extension, make<LUTFileWriter, Format>, nullptr};
 }
 
-// Tested from the top; the first match decides.
+// Tested from the top; the first match decides. One row a line.
+// clang-format off
 constexpr Row<LUTFileReader> kReaders[] = {
     reads<LUTFileReaderIridas>(".cube"),
     reads<LUTFileReaderIridas>(".itx"),
+    reads<LUTFileReaderVF>(".vf"),
+    reads<LUTFileReaderVF>(".gz"),
+    reads<LUTFileReaderVF>(".vfz"),
     {".icc", nullptr, "reader not found"},
 };
 
 constexpr Row<LUTFileWriter> kWriters[] = {
     writes<LUTFileWriterIridas>(".cube"),
+    writes<LUTFileWriterVF>(".vf"),
+    writes<LUTFileWriterVF>(".gz"),
+    writes<LUTFileWriterVF>(".vfz"),
     {".icc", nullptr, "writer not found"},
 };
+// clang-format on
 
 template <class Face, std::size_t kRowCount>
 boost::shared_ptr<Face> create(const Row<Face> (&rows)[kRowCount], const std::string& filename,
