@@ -4,8 +4,12 @@
 #include <string_view>
 
 #include "lut/Exception.h"
+#include "lut/io/LUTFileReaderCMS.h"
+#include "lut/io/LUTFileReaderCSP.h"
 #include "lut/io/LUTFileReaderIridas.h"
 #include "lut/io/LUTFileReaderVF.h"
+#include "lut/io/LUTFileWriterCMS.h"
+#include "lut/io/LUTFileWriterCSP.h"
 #include "lut/io/LUTFileWriterIridas.h"
 #include "lut/io/LUTFileWriterVF.h"
 
@@ -43,6 +47,8 @@ constexpr Row<LUTFileReader> kReaders[] = {
     reads<LUTFileReaderVF>(".vf"),
     reads<LUTFileReaderVF>(".gz"),
     reads<LUTFileReaderVF>(".vfz"),
+    reads<LUTFileReaderCSP>(".csp"),
+    reads<LUTFileReaderCMS>(".cms"),
     {".icc", nullptr, "reader not found"},
 };
 
@@ -51,6 +57,8 @@ constexpr Row<LUTFileWriter> kWriters[] = {
     writes<LUTFileWriterVF>(".vf"),
     writes<LUTFileWriterVF>(".gz"),
     writes<LUTFileWriterVF>(".vfz"),
+    writes<LUTFileWriterCSP>(".csp"),
+    writes<LUTFileWriterCMS>(".cms"),
     {".icc", nullptr, "writer not found"},
 };
 // clang-format on
