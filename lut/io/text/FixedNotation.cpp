@@ -3,28 +3,10 @@
 #include <charconv>
 #include <cmath>
 #include <cstdint>
-#include <cstring>
+
+#include "lut/io/text/DigitPairs.h"
 
 namespace Orlith::LUT {
-namespace {
-
-/// "00", "01", ... "99".
-struct DigitPairs {
-    char text[200];
-    constexpr DigitPairs() : text() {
-        for (int i = 0; i < 100; ++i) {
-            text[2 * i] = static_cast<char>('0' + i / 10);
-            text[2 * i + 1] = static_cast<char>('0' + i % 10);
-        }
-    }
-};
-constexpr DigitPairs kPairs;
-
-void writePair(char* out, std::uint32_t pair) {
-    std::memcpy(out, kPairs.text + 2 * pair, 2);
-}
-
-}  // namespace
 
 char* writeFixed(char* out, float value) {
     // A float has 24 significant bits and 10^6 is 2^6 * 5^6, 14 more: their product is exact in
@@ -43,9 +25,9 @@ char* writeFixed(char* out, float value) {
         out = std::to_chars(out, out + kFixedLength - 8, whole).ptr;
     }
     *out++ = '.';
-    writePair(out, fraction / 10000);
-    writePair(out + 2, fraction / 100 % 100);
-    writePair(out + 4, fraction % 100);
+    writeDigitPair(out, fraction / 10000);
+    writeDigitPair(out + 2, fraction / 100 % 100);
+    writeDigitPair(out + 4, fraction % 100);
     return out + 6;
 }
 

@@ -1,9 +1,14 @@
 #include "lut/io/text/LineWriter.h"
 
+#include <unistd.h>
+
+#include <cerrno>
 #include <charconv>
+#include <cstdint>
 #include <cstring>
 
 #include "lut/Exception.h"
+#include "lut/io/text/DigitPairs.h"
 #include "lut/io/text/FixedNotation.h"
 
 namespace Orlith::LUT {
@@ -12,13 +17,25 @@ namespace {
 constexpr std::size_t kBlockBytes = std::size_t{256} << 10;
 constexpr std::size_t kIntegerLength = 11;  // "-2147483648"
 
+/// @return the place after the last digit
+char* writeInteger(char* out, int number) {
+    if (number < 0 || number > 9999) return std::to_chars(out, out + kIntegerLength, number).ptr;
+    // The common codes: four digits, from the first that counts. No branch, since the lengths of
+    // neighbouring numbers are anyone's guess.
+    const auto code = static_cast<std::uint32_t>(number);
+    char digits[8] = {};
+    writeDigitPair(digits, code / 100);
+    writeDigitPair(digits + 2, code % 100);
+    const int skipped = int{code < 1000} + int{code < 100} + int{code < 10};
+    std::memcpy(out, digits + skipped, 4);
+    return out + 4 - skipped;
+}
+
 }  // namespace
 
 LineWriter::LineWriter(const std::string& filename, bool flushLines)
     : file_(std::fopen(filename.c_str(), "w")), handOverAt_(flushLines ? 0 : kBlockBytes) {
     if (!file_) throw Exception("unable to open file for writing");
-    // Lines are gathered here; a second buffer below would only copy them again.
-    std::setvbuf(file_.get(), nullptr, _IONBF, 0);
 }
 
 LineWriter::~LineWriter() {
@@ -33,7 +50,7 @@ LineWriter& LineWriter::text(std::string_view text) {
 
 LineWriter& LineWriter::integer(int number) {
     char* const out = reserve(kIntegerLength);
-    length_ += static_cast<std::size_t>(std::to_chars(out, out + kIntegerLength, number).ptr - out);
+    length_ += static_cast<std::size_t>(writeInteger(out, number) - out);
     return *this;
 }
 
@@ -55,7 +72,14 @@ LineWriter& LineWriter::fixedTriple(const float* rgb) {
 }
 
 LineWriter& LineWriter::integerTriple(const int* rgb) {
-    return integer(rgb[0]).text(" ").integer(rgb[1]).text(" ").integer(rgb[2]);
+    char* const start = reserve(3 * kIntegerLength + 2);
+    char* out = writeInteger(start, rgb[0]);
+    *out++ = ' ';
+    out = writeInteger(out, rgb[1]);
+    *out++ = ' ';
+    out = writeInteger(out, rgb[2]);
+    length_ += static_cast<std::size_t>(out - start);
+    return *this;
 }
 
 void LineWriter::endLine() {
@@ -70,8 +94,17 @@ char* LineWriter::reserve(std::size_t length) {
 }
 
 void LineWriter::handOver() {
-    if (length_ == 0) return;
-    std::fwrite(gathered_.data(), 1, length_, file_.get());
+    // Past the file's own buffer: lines are gathered here already, and one call a line is all the
+    // time there is when every line is handed over.
+    const int descriptor = fileno(file_.get());
+    const char* at = gathered_.data();
+    while (length_ > 0) {
+        const ssize_t byteCount = ::write(descriptor, at, length_);
+        if (byteCount < 0 && errno == EINTR) continue;
+        if (byteCount <= 0) break;  // a full disk: the rest is lost
+        at += byteCount;
+        length_ -= static_cast<std::size_t>(byteCount);
+    }
     length_ = 0;
 }
 
