@@ -32,20 +32,30 @@ void forEachRedFastest(const LatticeSize& size, Visit&& visit) {
         visit(element);
 }
 
-/// Calls visit(element) for every point, blue fastest, then green, then red; element is the point's
-/// place in storage.
+/// Calls visit(element) for the points, blue fastest, then green, then red, as long as it returns
+/// true; element is the point's place in storage.
 template <class Visit>
-void forEachBlueFastest(const LatticeSize& size, Visit&& visit) {
+void whileBlueFastest(const LatticeSize& size, Visit&& visit) {
     if (!size.hasPoints()) return;
     const auto width = static_cast<std::size_t>(size.width);
     const auto height = static_cast<std::size_t>(size.height);
     const auto depth = static_cast<std::size_t>(size.depth);
     for (std::size_t r = 0; r < width; ++r) {
         for (std::size_t g = 0; g < height; ++g) {
-            for (std::size_t b = 0; b < depth; ++b)
-                visit((b * height + g) * width + r);
+            for (std::size_t b = 0; b < depth; ++b) {
+                if (!visit((b * height + g) * width + r)) return;
+            }
         }
     }
+}
+
+/// The same for every point, whatever visit(element) returns.
+template <class Visit>
+void forEachBlueFastest(const LatticeSize& size, Visit&& visit) {
+    whileBlueFastest(size, [&](std::size_t element) {
+        visit(element);
+        return true;
+    });
 }
 
 /// Where the next data line of a file goes, for formats whose data wraps round at the end.

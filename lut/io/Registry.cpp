@@ -4,10 +4,12 @@
 #include <string_view>
 
 #include "lut/Exception.h"
+#include "lut/io/LUTFileReader3DL.h"
 #include "lut/io/LUTFileReaderCMS.h"
 #include "lut/io/LUTFileReaderCSP.h"
 #include "lut/io/LUTFileReaderIridas.h"
 #include "lut/io/LUTFileReaderVF.h"
+#include "lut/io/LUTFileWriter3DL.h"
 #include "lut/io/LUTFileWriterCMS.h"
 #include "lut/io/LUTFileWriterCSP.h"
 #include "lut/io/LUTFileWriterIridas.h"
@@ -44,6 +46,7 @@ constexpr Row<LUTFileWriter> writes(std::string_view extension) {
 constexpr Row<LUTFileReader> kReaders[] = {
     reads<LUTFileReaderIridas>(".cube"),
     reads<LUTFileReaderIridas>(".itx"),
+    reads<LUTFileReader3DL>(".3dl"),
     reads<LUTFileReaderVF>(".vf"),
     reads<LUTFileReaderVF>(".gz"),
     reads<LUTFileReaderVF>(".vfz"),
@@ -54,6 +57,7 @@ constexpr Row<LUTFileReader> kReaders[] = {
 
 constexpr Row<LUTFileWriter> kWriters[] = {
     writes<LUTFileWriterIridas>(".cube"),
+    writes<LUTFileWriter3DL>(".3dl"),
     writes<LUTFileWriterVF>(".vf"),
     writes<LUTFileWriterVF>(".gz"),
     writes<LUTFileWriterVF>(".vfz"),

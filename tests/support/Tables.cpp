@@ -68,24 +68,29 @@ std::string messageOf(const std::function<void()>& action) {
     return "(no exception)";
 }
 
-boost::shared_ptr<ol::LUT> readBytes(const std::string& extension, std::string_view bytes) {
+boost::shared_ptr<ol::LUT> readBytes(const std::string& extension, std::string_view bytes,
+                                     const Prepare& prepare) {
     const TempFolder folder;
-    return ol::createReader("", true, extension)->read(folder.write("table", bytes));
+    const auto reader = ol::createReader("", true, extension);
+    prepare(*reader);
+    return reader->read(folder.write("table", bytes));
 }
 
 void expectRefused(const std::string& extension, const std::string& good,
-                   const std::vector<BadFile>& badFiles) {
-    ASSERT_EQ(messageOf([&] { readBytes(extension, good); }), "(no exception)");
+                   const std::vector<BadFile>& badFiles, const Prepare& prepare) {
+    ASSERT_EQ(messageOf([&] { readBytes(extension, good, prepare); }), "(no exception)");
     for (const BadFile& bad : badFiles) {
         SCOPED_TRACE(bad.name);
         const std::string bytes = replaced(good, bad.from, bad.to);
-        EXPECT_EQ(messageOf([&] { readBytes(extension, bytes); }), bad.message);
+        EXPECT_EQ(messageOf([&] { readBytes(extension, bytes, prepare); }), bad.message);
     }
 }
 
-void expectTruncationsAreSafe(const std::string& extension, const std::string& bytes) {
+void expectTruncationsAreSafe(const std::string& extension, const std::string& bytes,
+                              const Prepare& prepare) {
     const TempFolder folder;
     const auto reader = ol::createReader("", true, extension);
+    prepare(*reader);
     for (std::size_t byteCount = 0; byteCount < bytes.size(); ++byteCount) {
         const std::string file = folder.write("cut", std::string_view(bytes).substr(0, byteCount));
         try {

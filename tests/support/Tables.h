@@ -8,6 +8,7 @@
 
 #include "lut/LUT1D.h"
 #include "lut/LUT3D.h"
+#include "lut/io/LUTFileReader.h"
 
 namespace test {
 
@@ -33,8 +34,13 @@ void expectSamplesNear(const ol::LUT& actual, const ol::LUT& expected, float tol
 /// The message of the Exception that an action throws; "(no exception)" if it throws none.
 std::string messageOf(const std::function<void()>& action);
 
+/// Gives a reader the properties that its format needs.
+using Prepare = std::function<void(ol::LUTFileReader&)>;
+inline void asItIs(ol::LUTFileReader&) {}
+
 /// Reads bytes with the reader of an extension.
-boost::shared_ptr<ol::LUT> readBytes(const std::string& extension, std::string_view bytes);
+boost::shared_ptr<ol::LUT> readBytes(const std::string& extension, std::string_view bytes,
+                                     const Prepare& prepare = asItIs);
 
 /// A wrong file, made from a good one by replacing a piece, and the message that refuses it.
 struct BadFile {
@@ -46,11 +52,12 @@ struct BadFile {
 
 /// Expects the good file to be read and each of the bad ones to be refused with its message.
 void expectRefused(const std::string& extension, const std::string& good,
-                   const std::vector<BadFile>& badFiles);
+                   const std::vector<BadFile>& badFiles, const Prepare& prepare = asItIs);
 
 /// Reads every truncation of a file's bytes, each from a file of just that size. Each has to give a
 /// table, an Exception or the standard library's length error; under the address sanitizer, without
 /// reading or writing outside an array.
-void expectTruncationsAreSafe(const std::string& extension, const std::string& bytes);
+void expectTruncationsAreSafe(const std::string& extension, const std::string& bytes,
+                              const Prepare& prepare = asItIs);
 
 }  // namespace test
