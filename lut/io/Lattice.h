@@ -18,16 +18,20 @@ struct LatticeSize {
 
     /// Without points no loop over the lattice may start, however long the other sides.
     bool hasPoints() const { return width > 0 && height > 0 && depth > 0; }
+
+    /// Of a size that a table has taken: others may not fit.
+    std::size_t pointCount() const {
+        if (!hasPoints()) return 0;
+        return static_cast<std::size_t>(width) * static_cast<std::size_t>(height) *
+               static_cast<std::size_t>(depth);
+    }
 };
 
 /// Calls visit(element) for every point in the order of storage: red fastest, then green, then
 /// blue.
 template <class Visit>
 void forEachRedFastest(const LatticeSize& size, Visit&& visit) {
-    if (!size.hasPoints()) return;
-    const std::size_t pointCount = static_cast<std::size_t>(size.width) *
-                                   static_cast<std::size_t>(size.height) *
-                                   static_cast<std::size_t>(size.depth);
+    const std::size_t pointCount = size.pointCount();
     for (std::size_t element = 0; element < pointCount; ++element)
         visit(element);
 }

@@ -8,11 +8,13 @@
 #include "lut/io/LUTFileReaderCMS.h"
 #include "lut/io/LUTFileReaderCSP.h"
 #include "lut/io/LUTFileReaderIridas.h"
+#include "lut/io/LUTFileReaderTruelight.h"
 #include "lut/io/LUTFileReaderVF.h"
 #include "lut/io/LUTFileWriter3DL.h"
 #include "lut/io/LUTFileWriterCMS.h"
 #include "lut/io/LUTFileWriterCSP.h"
 #include "lut/io/LUTFileWriterIridas.h"
+#include "lut/io/LUTFileWriterTruelight.h"
 #include "lut/io/LUTFileWriterVF.h"
 
 namespace Orlith::LUT {
@@ -45,7 +47,9 @@ constexpr Row<LUTFileWriter> writes(std::string_view extension) {
 // clang-format off
 constexpr Row<LUTFileReader> kReaders[] = {
     reads<LUTFileReaderIridas>(".cube"),
+    reads<LUTFileReaderIridas>(".cube"),   reads<LUTFileReaderIridas>(".itx"),
     reads<LUTFileReaderIridas>(".itx"),
+    reads<LUTFileReaderTruelight>(".cub"), {".icc", nullptr, "reader not found"},
     reads<LUTFileReader3DL>(".3dl"),
     reads<LUTFileReaderVF>(".vf"),
     reads<LUTFileReaderVF>(".gz"),
@@ -62,6 +66,7 @@ constexpr Row<LUTFileWriter> kWriters[] = {
     writes<LUTFileWriterVF>(".gz"),
     writes<LUTFileWriterVF>(".vfz"),
     writes<LUTFileWriterCSP>(".csp"),
+    writes<LUTFileWriterTruelight>(".cub"),
     writes<LUTFileWriterCMS>(".cms"),
     {".icc", nullptr, "writer not found"},
 };

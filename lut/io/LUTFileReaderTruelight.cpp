@@ -1,0 +1,193 @@
+// Truelight cube (.cub): text, red fastest.
+//
+//   # Truelight Cube v2.0   a mark that stands alone starts a keyword line; unknown ones, as these
+//   # iDims 3               first three, are ignored
+//   # oDims 3
+//   # width 2 3 4           points along red, green, blue
+//   # lutLength 5           optional: entries of the input LUT
+//   # InputLUT              what follows is input LUT:
+//   0.0 0.0 0.0               the lattice position of an input colour, for each channel
+//   ...
+//   # Cube                  what follows is cube, as it is from the start of the file:
+//   0.0 0.1 0.2               sample (0, 0, 0)
+//   1.0 0.1 0.2               sample (1, 0, 0)
+//   ...
+//   # end                   optional; nothing after it is read
+//
+// Keywords are known in upper and lower case. Lines are split into words before anything is
+// trimmed. Surplus samples start over from the first point, missing ones stay zero; no count is
+// checked.
+
+#include "lut/io/LUTFileReaderTruelight.h"
+
+#include <algorithm>
+#include <boost/algorithm/string/case_conv.hpp>
+#include <boost/smart_ptr/make_shared.hpp>
+#include <cstring>
+#include <fstream>
+#include <locale>
+#include <stdexcept>
+#include <vector>
+
+#include "lut/Exception.h"
+#include "lut/LUT3D.h"
+#include "lut/io/Lattice.h"
+#include "lut/io/text/LineSource.h"
+#include "lut/io/text/Numbers.h"
+#include "lut/io/text/Tokens.h"
+
+namespace Orlith::LUT {
+namespace {
+
+constexpr char kCubeError[] =
+    "Truelight LUT reader: syntax error while reading LUT data (too many or not enough values).";
+constexpr char kInputLUTError[] =
+    "Truelight LUT reader: syntax error while reading pre-LUT data (too many or not enough "
+    "values).";
+
+/// The samples of the cube in the order of the file, until the last width line is known.
+///
+/// A second width line resizes the table: samples keep their place in storage, and the position of
+/// the next one stays. Doing that to the table itself would copy, and so touch, whatever a small
+/// file claims, once for every such line.
+class CubeSamples {
+public:
+    explicit CubeSamples(LUT3D& lut) : lut_(lut) {}
+
+    /// @throws std::length_error  no lattice can be of that size
+    void resize(const LatticeSize& size) {
+        lut_.resize(0);
+        lut_.resize(size.width, size.height, size.depth);
+        size_ = size;
+        spans_.push_back({samples_.size(), size, next_, size.pointCount()});
+    }
+
+    void add(const RGB& rgb) {
+        if (!next_.isInside(size_)) throw Exception(kCubeError);
+        samples_.push_back(rgb);
+        next_.advanceRedFastest(size_);
+    }
+
+    /// Stores the samples in the table.
+    void place() {
+        // What one lattice has cut off does not come back with a larger one.
+        for (std::size_t i = spans_.size(); i-- > 1;) {
+            spans_[i - 1].reach = std::min(spans_[i - 1].reach, spans_[i].reach);
+        }
+        for (std::size_t i = 0; i < spans_.size(); ++i) {
+            place(spans_[i], i + 1 < spans_.size() ? spans_[i + 1].begin : samples_.size());
+        }
+    }
+
+private:
+    /// The samples between two width lines.
+    struct Span {
+        std::size_t begin;
+        LatticeSize size;
+        LatticePosition first;
+        std::size_t reach;  // places in storage that this and all later lattices have
+    };
+
+    void place(const Span& span, std::size_t end) {
+        float* const out = lut_.data();
+        LatticePosition position = span.first;
+        for (std::size_t i = span.begin; i < end; ++i) {
+            const std::size_t element = position.element(span.size);
+            if (element < span.reach) std::memcpy(out + 3 * element, &samples_[i], sizeof(RGB));
+            position.advanceRedFastest(span.size);
+        }
+    }
+
+    LUT3D& lut_;
+    LatticeSize size_;
+    LatticePosition next_;
+    std::vector<RGB> samples_;
+    std::vector<Span> spans_;
+};
+
+enum class Data { InputLUT, Cube };
+
+void readWidth(const Tokens& tokens, CubeSamples& cube) {
+    if (tokens.count() != 5) throw Exception("Truelight LUT reader: expected 3 values for width.");
+    cube.resize({toInt(tokens[2]), toInt(tokens[3]), toInt(tokens[4])});
+}
+
+void readInputLUTLength(const Tokens& tokens, Shaper& inputLUT) {
+    if (tokens.count() < 3) return;
+    const int entryCount = toInt(tokens[2]);
+    if (entryCount < 0) throw std::length_error("Truelight LUT reader: negative lutLength");
+    // Only the count is believed: the entries grow as they are read.
+    inputLUT.counts.fill(static_cast<float>(entryCount));
+}
+
+/// A keyword line: "#", keyword, values.
+/// @return false if nothing more is to be read
+bool readKeyword(const Tokens& tokens, LUT& lut, CubeSamples& cube, Data& data) {
+    // Deliberate: lines are not trimmed, so a carriage return is part of the keyword that it
+    // follows, which is then unknown. Held by TruelightReader.DoesNotKnowAKeywordWithAReturn.
+    const std::string keyword =
+        boost::algorithm::to_lower_copy(std::string(tokens[1]), std::locale::classic());
+    if (keyword == "width") readWidth(tokens, cube);
+    if (keyword == "lutlength") readInputLUTLength(tokens, lut.outputShaper);
+    if (keyword == "inputlut") data = Data::InputLUT;
+    if (keyword == "cube") data = Data::Cube;
+    return keyword != "end";
+}
+
+/// A data line that is no plain triple: three words, of which trimming leaves three.
+/// @return false if trimming leaves nothing, as of a cube line of form feeds: it is skipped
+bool readData(std::string_view line, Tokens& tokens, Data data, RGB& rgb) {
+    if (tokens.count() != 3) {
+        throw Exception(data == Data::Cube ? kCubeError
+                                           : "Truelight LUT reader: expecting more pre-LUT data.");
+    }
+    tokens.split(trim(line));
+    if (data == Data::Cube && tokens.empty()) return false;
+    if (tokens.count() != 3) throw Exception(data == Data::Cube ? kCubeError : kInputLUTError);
+    rgb = RGB(toFloat(tokens[0]), toFloat(tokens[1]), toFloat(tokens[2]));
+    return true;
+}
+
+}  // namespace
+
+boost::shared_ptr<LUT> LUTFileReaderTruelight::read(const std::string& filename) {
+    beginRead();
+    std::ifstream file(filename);
+    if (!file) throw Exception("Truelight LUT reader: unable to open file.");
+    LineSource lines(file, lineNumber_);
+
+    const auto lut = boost::make_shared<LUT3D>();
+    lut_ = lut;
+    CubeSamples cube(*lut);
+    std::vector<RGB>& inputLUT = lut->outputShaper.entries;
+    Data data = Data::Cube;
+    std::string_view line;
+    Tokens tokens;
+    RGB rgb;
+    while (lines.next(line)) {
+        if (!parsePlainTriple(line, rgb)) {
+            tokens.split(line);
+            if (tokens.empty()) continue;
+            if (tokens[0] == "#") {
+                if (!readKeyword(tokens, *lut, cube, data)) break;
+                continue;
+            }
+            if (!readData(line, tokens, data, rgb)) continue;
+        }
+        if (data == Data::InputLUT) {
+            inputLUT.push_back(rgb);
+        } else {
+            cube.add(rgb);
+            ++sampleCount_;
+        }
+    }
+    if (inputLUT.empty() && sampleCount_ == 0) {
+        throw Exception("Truelight LUT reader: syntax error while reading LUT data.");
+    }
+    cube.place();
+    // An input LUT leads from inputs to lattice positions by itself: identity.
+    if (inputLUT.empty()) setUnitDomain(*lut, lut->width(), lut->height(), lut->depth());
+    return lut;
+}
+
+}  // namespace Orlith::LUT
