@@ -5,12 +5,14 @@
 
 #include "lut/Exception.h"
 #include "lut/io/LUTFileReader3DL.h"
+#include "lut/io/LUTFileReaderBLUT.h"
 #include "lut/io/LUTFileReaderCMS.h"
 #include "lut/io/LUTFileReaderCSP.h"
 #include "lut/io/LUTFileReaderIridas.h"
 #include "lut/io/LUTFileReaderTruelight.h"
 #include "lut/io/LUTFileReaderVF.h"
 #include "lut/io/LUTFileWriter3DL.h"
+#include "lut/io/LUTFileWriterBLUT.h"
 #include "lut/io/LUTFileWriterCMS.h"
 #include "lut/io/LUTFileWriterCSP.h"
 #include "lut/io/LUTFileWriterIridas.h"
@@ -57,6 +59,7 @@ constexpr Row<LUTFileReader> kReaders[] = {
     reads<LUTFileReaderCSP>(".csp"),
     reads<LUTFileReaderCMS>(".cms"),
     {".icc", nullptr, "reader not found"},
+    reads<LUTFileReaderBLUT>(".blut"),
 };
 
 constexpr Row<LUTFileWriter> kWriters[] = {
@@ -69,6 +72,7 @@ constexpr Row<LUTFileWriter> kWriters[] = {
     writes<LUTFileWriterTruelight>(".cub"),
     writes<LUTFileWriterCMS>(".cms"),
     {".icc", nullptr, "writer not found"},
+    writes<LUTFileWriterBLUT>(".blut"),
 };
 // clang-format on
 
