@@ -9,8 +9,10 @@
 #include <cerrno>
 #include <cstdint>
 #include <fstream>
+#include <iterator>
 #include <limits>
 #include <new>
+#include <string_view>
 #include <system_error>
 
 #include "host/Error.h"
@@ -28,7 +30,8 @@ constexpr std::array<zefra::Channel, 3> kChannels = {zefra::kRed, zefra::kGreen,
 constexpr std::uintmax_t kMaxPixelsPerByte = 65536;
 
 [[noreturn]] void fail(const std::string& path, const std::string& reason) {
-    throw Error(fmt::format("{}: {}", path, oneLine(reason)));
+    const std::string line = firstLine(reason);
+    throw Error(fmt::format("{}: {}", path, line.empty() ? "is damaged or cut off" : line));
 }
 
 /// Answers for the commonest mistakes in the system's words.
@@ -92,6 +95,16 @@ void expectPlainImage(const OIIO::ImageSpec& spec, std::uintmax_t byteCount,
     }
 }
 
+/// JPEG alone is decoded to a picture of any length: what is missing comes out grey. A whole file
+/// has its end marker, which coded data never contain, at its end or a little before.
+void expectWholeJPEG(const std::string& path, std::uintmax_t byteCount) {
+    constexpr std::uintmax_t kTailBytes = 65536;
+    std::ifstream file(path, std::ios::binary);
+    file.seekg(-static_cast<std::streamoff>(std::min(byteCount, kTailBytes)), std::ios::end);
+    const std::string tail{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+    if (tail.find("\xff\xd9") == std::string::npos) fail(path, "is cut off");
+}
+
 }  // namespace
 
 struct ImageFile::Source {
@@ -137,10 +150,12 @@ void ImageFile::readPixels() {
     }
 
     OIIO::ImageInput& input = *source->input;
+    if (std::string_view(input.format_name()) == "jpeg") expectWholeJPEG(path_, byteCount_);
     const auto read = [&](int firstChannel, int channelCount, float* target) {
         constexpr OIIO::stride_t kPixelBytes = 3 * sizeof(float);
         if (!input.read_image(0, 0, firstChannel, firstChannel + channelCount, OIIO::TypeFloat,
-                              target, kPixelBytes)) {
+                              target, kPixelBytes) ||
+            input.has_error()) {  // TIFF: strips that are not there, and still a good result
             fail(path_, input.geterror());
         }
     };

@@ -25,4 +25,9 @@ std::string oneLine(std::string_view text) {
     return line;
 }
 
+std::string firstLine(std::string_view text) {
+    text = trimmed(text);
+    return std::string(trimmed(text.substr(0, text.find_first_of("\r\n"))));
+}
+
 }  // namespace host

@@ -11,4 +11,7 @@ std::string_view trimmed(std::string_view text);
 /// A text of several lines in one: line ends, and the blanks around them, become single blanks.
 std::string oneLine(std::string_view text);
 
+/// The first line of a text that says anything.
+std::string firstLine(std::string_view text);
+
 }  // namespace host
