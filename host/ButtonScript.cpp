@@ -142,7 +142,7 @@ std::string describe(const py::error_already_set& raised) {
 }  // namespace
 
 void runButtonScript(Host& host, Node& node, const PanelControl& button) {
-    const std::string place = fmt::format("{}.{}: ", node.name(), button.name());
+    const std::string name = fmt::format("{}.{}", node.name(), button.name());
     const std::string script = button.script();  // the button may be replaced while it runs
     Press press{host, node};
     const PressScope scope(press);
@@ -150,11 +150,14 @@ void runButtonScript(Host& host, Node& node, const PanelControl& button) {
         startPython();
         py::dict names;
         names["zefra"] = py::module_::import("zefra");
-        py::exec(script, names);
+        const auto builtins = py::module_::import("builtins");
+        names["__builtins__"] = builtins;
+        const py::object code = builtins.attr("compile")(script, name, "exec");
+        builtins.attr("exec")(code, names);
     } catch (const py::error_already_set& raised) {
-        throw Error(place + describe(raised));
+        throw Error(fmt::format("{}: {}", name, describe(raised)));
     } catch (const std::exception& failure) {
-        throw Error(place + oneLine(failure.what()));
+        throw Error(fmt::format("{}: {}", name, oneLine(failure.what())));
     }
 }
 

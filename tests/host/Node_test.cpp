@@ -1,0 +1,253 @@
+#include "host/Node.h"
+
+#include <filesystem>
+#include <stdexcept>
+
+#include "host/ProgressDisplay.h"
+#include "tests/host/HostFixture.h"
+
+namespace {
+
+using test::failureOf;
+using Kind = host::PanelControl::Kind;
+using NodeTest = test::HostTest;
+
+std::vector<std::string> controlNames(const host::Node& node) {
+    std::vector<std::string> names;
+    for (const auto& control : node.controls())
+        names.push_back(control->name());
+    return names;
+}
+
+TEST_F(NodeTest, ShowsTheControlsAsTheOperatorDeclaresThem) {
+    host::Node& node = host_.createNode("GenerateLUT");
+    EXPECT_EQ(controlNames(node),
+              (std::vector<std::string>{"file", "output_file", "file_type", "", "lut1d", "style1d",
+                                        "bitdepth_id", "scratch_compatible", "", "generate"}));
+    const host::PanelControl& type = *node.findControl("file_type");
+    EXPECT_EQ(type.kind(), Kind::Enumeration);
+    EXPECT_EQ(type.label(), "file type");
+    EXPECT_EQ(type.flags(), 0x88010000U);
+    EXPECT_EQ(type.tooltip().substr(0, 26), "If the file type is blank,");
+    EXPECT_EQ(type.items().size(), 8U);
+    EXPECT_EQ(node.controls()[3]->kind(), Kind::TextLine);
+    EXPECT_EQ(node.findControl("generate")->kind(), Kind::ScriptButton);
+    EXPECT_EQ(node.value("lut1d"), "1024");
+    EXPECT_EQ(node.value("style1d"), "logarithmic");
+}
+
+TEST_F(NodeTest, ExchangesTheTypeControlsAndKeepsTheirValues) {
+    host::Node& node = host_.createNode("GenerateLUT");
+    const host::PanelControl* const type = node.findControl("file_type");
+    node.setValue("lut1d", "77");
+    node.setValue("file_type", ".3dl");
+    EXPECT_EQ(controlNames(node),
+              (std::vector<std::string>{"file", "output_file", "file_type", "lut1d", "style1d", "",
+                                        "bitdepth_id", "output_bitdepth_id", "clamp_output",
+                                        "format_3dl_id", "scratch_compatible", "", "generate"}));
+    EXPECT_EQ(node.findControl("lut1d")->kind(), Kind::Obsolete);
+    EXPECT_EQ(node.findControl("clamp_output")->flags(), 0x100U);
+    node.setValue("lut1d", "5");  // obsolete now: dropped
+    node.setValue("bitdepth_id", "16 bit");
+    node.setValue("file", "grade.csp");  // the operator follows the name
+    EXPECT_EQ(node.value("file_type"), ".csp");
+    EXPECT_EQ(node.value("lut1d"), "77");
+    node.setValue("bitdepth_id", "0");  // obsolete here
+    node.setValue("file_type", "1");
+    EXPECT_EQ(node.value("bitdepth_id"), "16 bit");
+    EXPECT_EQ(node.findControl("file_type"), type);
+    EXPECT_TRUE(node.takeErrors().empty());
+}
+
+TEST_F(NodeTest, UnderstandsTextByTheKindOfControl) {
+    const struct {
+        const char *control, *text, *shown;
+    } kCases[] = {
+        {"file_type", ".3dl", ".3dl"},
+        {"file_type", "   ", "   "},
+        {"file_type", ".vf ", ".vf"},
+        {"file_type", "", "   "},
+        {"file_type", "1", ".3dl"},
+        {"format_3dl_id", "3", "3"},
+        {"format_3dl_id", "2", "assimulate scratch"},
+        {"clamp_output", "no", "false"},
+        {"clamp_output", "True", "true"},
+        {"clamp_output", "off", "false"},
+        {"clamp_output", "1", "true"},
+        {"file_type", "6", ".cube"},
+        {"lut1d", "-2147483648", "-2147483648"},
+        {"lut1d", " +12 ", "12"},
+        {"file", " two words.cube", " two words.cube"},
+    };
+    host::Node& node = host_.createNode("GenerateLUT");
+    for (const auto& each : kCases) {
+        SCOPED_TRACE(std::string(each.control) + " " + each.text);
+        node.setValue(each.control, each.text);
+        EXPECT_EQ(node.value(each.control), each.shown);
+    }
+}
+
+TEST_F(NodeTest, RefusesTextThatDoesNotFit) {
+    const struct {
+        const char *control, *text, *failure;
+    } kCases[] = {
+        {"foo", "1", "GenerateLUT1: no control named \"foo\""},
+        {"", "1", "GenerateLUT1: no control named \"\""},
+        {"format_3dl_id", "-1", "GenerateLUT1.format_3dl_id: \"-1\" is not on the menu"},
+        {"format_3dl_id", "", "GenerateLUT1.format_3dl_id: \"\" is not on the menu"},
+        {"file_type", ".xyz", "GenerateLUT1.file_type: \".xyz\" is not on the menu"},
+        {"clamp_output", "maybe", "GenerateLUT1.clamp_output: \"maybe\" is neither true nor false"},
+        {"generate", "1", "GenerateLUT1.generate: the control has no value"},
+    };
+    host::Node& node = host_.createNode("GenerateLUT");
+    node.setValue("file_type", ".3dl");
+    for (const auto& each : kCases)
+        EXPECT_EQ(failureOf([&] { node.setValue(each.control, each.text); }), each.failure);
+    EXPECT_EQ(node.value("format_3dl_id"), "autodesk flame/smoke");
+    EXPECT_EQ(failureOf([&] { node.value("generate"); }),
+              "GenerateLUT1.generate: the control has no value");
+
+    node.setValue("file_type", ".vf");
+    for (const std::string text : {"abc", "1.5", "12 13", "", "99999999999", "+-1", "0x10"}) {
+        EXPECT_EQ(failureOf([&] { node.setValue("lut1d", text); }),
+                  "GenerateLUT1.lut1d: \"" + text + "\" is not an integer");
+    }
+    EXPECT_EQ(node.value("lut1d"), "1024");
+}
+
+TEST_F(NodeTest, RefusesInputsThatCannotBe) {
+    host::Node& read = host_.createNode("Read");
+    host::Node& first = host_.createNode("GenerateLUT");
+    host::Node& second = host_.createNode("GenerateLUT");
+    EXPECT_EQ(failureOf([&] { read.connect(0, first); }), "Read1: there is no input 0");
+    EXPECT_EQ(failureOf([&] { first.connect(1, read); }), "GenerateLUT1: there is no input 1");
+    second.connect(0, first);
+    EXPECT_EQ(failureOf([&] { first.connect(0, second); }),
+              "GenerateLUT1: GenerateLUT2 depends on it already");
+}
+
+// Execution.
+
+TEST_F(NodeTest, ExecutesTheRealOperator) {
+    host::Node& node = generator();
+    node.setValue("file", folder_.path("identity.cube"));
+    node.execute();
+    EXPECT_TRUE(node.takeErrors().empty());
+    EXPECT_EQ(test::readFile(folder_.path("identity.cube")), test::kIdentityCube);
+}
+
+TEST_F(NodeTest, CollectsFailuresOfAnExecution) {
+    using Texts = std::vector<std::string>;
+    host::Node& read = host_.createNode("Read");
+    read.execute();
+    EXPECT_EQ(read.takeErrors(), (Texts{"Read1: there is nothing to execute"}));
+
+    host::Node& node = host_.createNode("GenerateLUT");
+    node.setValue("file", folder_.path("out.cube"));
+    node.execute();
+    EXPECT_EQ(node.takeErrors(), (Texts{"GenerateLUT1: input 0 is not connected"}));
+
+    node.connect(0, read);
+    read.setValue("file", folder_.path("missing.exr"));
+    node.execute();
+    EXPECT_EQ(node.takeErrors(),
+              (Texts{folder_.path("missing.exr") + ": No such file or directory"}));
+    EXPECT_TRUE(node.takeErrors().empty());
+    EXPECT_FALSE(std::filesystem::exists(folder_.path("out.cube")));
+}
+
+/// An operator that fails as it is told.
+class FailingOp final : public zefra::Op, public zefra::Executable {
+public:
+    using Op::Op;
+    const char* className() const override { return "Failing"; }
+    const char* help() const override { return ""; }
+    zefra::Executable* asExecutable() override { return this; }
+    void knobs(zefra::ControlPass& pass) override {
+        pass.integer(&way_, "way", "way");
+        pass.obsolete("loop", "knob loop $value");
+        pass.obsolete("chain", "knob way_old [expr $value + 1]");
+        pass.obsolete("way_old", "knob way $value");
+        pass.obsolete("broken", "nonsense");
+    }
+    void execute() override {
+        switch (way_) {
+            case 0:
+                throw std::length_error("vector");
+            case 1:
+                throw std::bad_alloc();
+            case 2:
+                throw 7;
+            default:
+                error("way %d", way_);
+        }
+    }
+
+private:
+    int way_ = 0;
+};
+zefra::Op* makeFailing(zefra::Node& node) {
+    return new FailingOp(node);
+}
+
+TEST_F(NodeTest, PutsEveryExceptionIntoWords) {
+    const zefra::Description description("Failing", "", makeFailing);
+    host::Host host;
+    host::Node& node = host.createNode("Failing");
+    const char* const kTexts[] = {"the table would be too large", "not enough memory",
+                                  "unknown failure", "way 3"};
+    for (int way = 0; way < 4; ++way) {
+        node.setValue("way", std::to_string(way));
+        node.execute();
+        EXPECT_EQ(node.takeErrors(), std::vector<std::string>{kTexts[way]});
+    }
+}
+
+TEST_F(NodeTest, RunsScriptsOfObsoleteNames) {
+    const zefra::Description description("Failing", "", makeFailing);
+    host::Host host;
+    host::Node& node = host.createNode("Failing");
+    node.setValue("chain", "41");
+    EXPECT_EQ(node.value("way"), "42");
+    EXPECT_EQ(failureOf([&] { node.setValue("chain", "0.5"); }),
+              "Failing1.chain: Failing1.way: \"1.5\" is not an integer");
+    EXPECT_EQ(failureOf([&] { node.setValue("loop", "1"); }),
+              "Failing1.loop: Failing1.loop: its script sets it again");
+    EXPECT_EQ(failureOf([&] { node.setValue("broken", "1"); }),
+              "Failing1.broken: invalid command name \"nonsense\"");
+    // A value is taken into an expression, so it is able to run commands, but not these.
+    EXPECT_EQ(failureOf([&] { node.setValue("chain", "[exec id]"); }),
+              "Failing1.chain: invalid command name \"exec\"");
+    EXPECT_EQ(node.value("way"), "42");
+}
+
+TEST_F(NodeTest, WritesNothingWhenCancelled) {
+    host::Node& node = generator();
+    node.setValue("file", folder_.path("cancelled.cube"));
+    host::Host::requestCancel();
+    node.execute();
+    EXPECT_TRUE(node.takeErrors().empty());
+    EXPECT_FALSE(std::filesystem::exists(folder_.path("cancelled.cube")));
+}
+
+TEST_F(NodeTest, ShowsProgressAndErasesIt) {
+    const std::string path = folder_.path("terminal");
+    std::FILE* const terminal = std::fopen(path.c_str(), "w");
+    ASSERT_NE(terminal, nullptr);
+    host::Node& node = generator();
+    node.setValue("file", folder_.path("shown.cube"));
+    host::ProgressDisplay silent(terminal, false);
+    node.setProgress(&silent);
+    node.execute();
+    EXPECT_EQ(test::readFile(path), "");
+    host::ProgressDisplay shown(terminal, true);
+    node.setProgress(&shown);
+    node.execute();
+    node.setProgress(nullptr);
+    std::fclose(terminal);
+    const std::string drawn = test::readFile(path);
+    EXPECT_EQ(drawn.find("\r\x1b[KAnalyzing frame [                    ]   0%"), 0U);
+    EXPECT_EQ(drawn.substr(drawn.size() - 4), "\r\x1b[K");
+}
+
+}  // namespace
