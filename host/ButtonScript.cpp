@@ -113,9 +113,10 @@ void executeMultiple(const std::vector<PythonNode>& pythonNodes,
 }
 
 /// Starts the interpreter that the program was built for, whatever the environment says about
-/// others. It lives as long as the program.
+/// others. It lives as long as the program and is not taken down at its end: extension modules that
+/// a script has loaded do not survive that reliably.
 void startPython() {
-    static const py::scoped_interpreter interpreter = [] {
+    static const auto* const interpreter = [] {
         PyPreConfig preparation;
         PyPreConfig_InitIsolatedConfig(&preparation);
         preparation.utf8_mode = 1;  // as in the paths that controls hold
@@ -127,8 +128,9 @@ void startPython() {
         config.write_bytecode = 0;
         PyConfig_SetBytesString(&config, &config.home, ORLITH_PYTHON_HOME);
         PyConfig_SetBytesString(&config, &config.program_name, ORLITH_PYTHON_HOME "/bin/python3");
-        return py::scoped_interpreter(&config, 0, nullptr, false);
+        return new py::scoped_interpreter(&config, 0, nullptr, false);
     }();
+    static_cast<void>(interpreter);
     // Standard output is for results.
     const auto sys = py::module_::import("sys");
     sys.attr("stdout") = sys.attr("stderr");
