@@ -13,6 +13,7 @@
 #include <pybind11/embed.h>
 #include <pybind11/stl.h>
 
+#include <algorithm>
 #include <array>
 #include <optional>
 #include <string>
@@ -103,12 +104,14 @@ std::optional<PythonNode> toNode(const std::string& name) {
 
 void executeMultiple(const std::vector<PythonNode>& pythonNodes,
                      const std::vector<std::array<int, 3>>& pythonRanges) {
-    std::vector<Node*> nodes;
-    for (const PythonNode& each : pythonNodes)
-        nodes.push_back(&each.node());
-    std::vector<FrameRange> ranges;
-    for (const auto& [first, last, step] : pythonRanges)
-        ranges.push_back({first, last, step});
+    std::vector<Node*> nodes(pythonNodes.size());
+    std::transform(pythonNodes.begin(), pythonNodes.end(), nodes.begin(),
+                   [](const PythonNode& each) { return &each.node(); });
+    std::vector<FrameRange> ranges(pythonRanges.size());
+    std::transform(pythonRanges.begin(), pythonRanges.end(), ranges.begin(),
+                   [](const std::array<int, 3>& each) {
+                       return FrameRange{each[0], each[1], each[2]};
+                   });
     press().host.executeMultiple(nodes, ranges);
 }
 
@@ -116,7 +119,7 @@ void executeMultiple(const std::vector<PythonNode>& pythonNodes,
 /// others. It lives as long as the program and is not taken down at its end: extension modules that
 /// a script has loaded do not survive that reliably.
 void startPython() {
-    static const auto* const interpreter = [] {
+    static const bool isStarted = [] {
         PyPreConfig preparation;
         PyPreConfig_InitIsolatedConfig(&preparation);
         preparation.utf8_mode = 1;  // as in the paths that controls hold
@@ -128,9 +131,10 @@ void startPython() {
         config.write_bytecode = 0;
         PyConfig_SetBytesString(&config, &config.home, ORLITH_PYTHON_HOME);
         PyConfig_SetBytesString(&config, &config.program_name, ORLITH_PYTHON_HOME "/bin/python3");
-        return new py::scoped_interpreter(&config, 0, nullptr, false);
+        py::initialize_interpreter(&config, 0, nullptr, false);
+        return true;
     }();
-    static_cast<void>(interpreter);
+    static_cast<void>(isStarted);
     // Standard output is for results.
     const auto sys = py::module_::import("sys");
     sys.attr("stdout") = sys.attr("stderr");
@@ -145,7 +149,6 @@ std::string describe(const py::error_already_set& raised) {
 
 void runButtonScript(Host& host, Node& node, const PanelControl& button) {
     const std::string name = fmt::format("{}.{}", node.name(), button.name());
-    const std::string script = button.script();  // the button may be replaced while it runs
     Press press{host, node};
     const PressScope scope(press);
     try {
@@ -154,7 +157,7 @@ void runButtonScript(Host& host, Node& node, const PanelControl& button) {
         names["zefra"] = py::module_::import("zefra");
         const auto builtins = py::module_::import("builtins");
         names["__builtins__"] = builtins;
-        const py::object code = builtins.attr("compile")(script, name, "exec");
+        const py::object code = builtins.attr("compile")(button.script(), name, "exec");
         builtins.attr("exec")(code, names);
     } catch (const py::error_already_set& raised) {
         throw Error(fmt::format("{}: {}", name, describe(raised)));
