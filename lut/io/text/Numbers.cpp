@@ -1,8 +1,10 @@
 #include "lut/io/text/Numbers.h"
 
+#include <boost/endian/conversion.hpp>
 #include <charconv>
 #include <clocale>
 #include <cstdlib>
+#include <cstring>
 #include <string>
 #include <system_error>
 
@@ -26,9 +28,6 @@ double toDouble(std::string_view token) {
     return toDoubleInCLocale(token);
 }
 
-constexpr double kPowersOfTen[] = {1e0, 1e1, 1e2,  1e3,  1e4,  1e5,  1e6,  1e7,
-                                   1e8, 1e9, 1e10, 1e11, 1e12, 1e13, 1e14, 1e15};
-
 bool isDigit(char c) {
     return static_cast<unsigned char>(c - '0') < 10;
 }
@@ -37,31 +36,92 @@ bool isSeparator(char c) {
     return c == ' ' || c == '\t';
 }
 
+/// Part of a line that is still to be read. It may end where readable memory ends.
+struct Rest {
+    const char* at;
+    const char* const end;
+    const char* const start;  // of the line
+
+    bool startsWith(char c) const { return at != end && *at == c; }
+
+    void skipSeparators() {
+        while (at != end && isSeparator(*at))
+            ++at;
+    }
+
+    /// The next eight bytes, the first one lowest; zero after the end.
+    std::uint64_t nextEight() const {
+        const auto left = static_cast<std::size_t>(end - at);
+        if (left >= 8) return boost::endian::load_little_u64(bytes(at));
+        if (left == 0) return 0;
+        if (end - start >= 8)
+            return boost::endian::load_little_u64(bytes(end - 8)) >> 8 * (8 - left);
+        unsigned char few[8] = {};
+        std::memcpy(few, at, left);
+        return boost::endian::load_little_u64(few);
+    }
+
+    static const unsigned char* bytes(const char* text) {
+        return reinterpret_cast<const unsigned char*>(text);
+    }
+};
+
+constexpr std::uint64_t everyByte(std::uint64_t byte) {
+    return 0x0101010101010101U * byte;
+}
+
+/// Takes the digits that come next and appends them to `number`, eight at a time.
+/// @return how many there were; number has wrapped if that is more than 19
+std::ptrdiff_t takeDigits(Rest& rest, std::uint64_t& number) {
+    static constexpr std::uint64_t kPowers[] = {1,      10,      100,      1000,     10000,
+                                                100000, 1000000, 10000000, 100000000};
+    const char* const first = rest.at;
+    unsigned count = 8;
+    while (count == 8) {
+        // The values of the digits; the first byte of 10 or more is no digit. A carry out of
+        // that byte spoils later ones only.
+        std::uint64_t digits = rest.nextEight() ^ everyByte('0');
+        const std::uint64_t others = ((digits + everyByte(0x80 - 10)) | digits) & everyByte(0x80);
+        count = others == 0 ? 8 : static_cast<unsigned>(__builtin_ctzll(others)) / 8;
+        if (count == 0) break;
+        // Zeros in front make them eight; then neighbours are joined to pairs, and pairs to eight.
+        digits <<= 8 * (8 - count);
+        digits = 10 * digits + (digits >> 8);
+        constexpr std::uint64_t kPairs = 0x000000FF000000FF;
+        digits = ((digits & kPairs) * (100 + (1000000ULL << 32)) +
+                  ((digits >> 16) & kPairs) * (1 + (10000ULL << 32))) >>
+                 32;
+        number = number * kPowers[count] + digits;
+        rest.at += count;
+    }
+    return rest.at - first;
+}
+
 /// Reads [-]digits[.digits] of at most 15 digits. Both the digits as an integer and the power of
 /// ten are exact doubles then, so that their quotient is the correctly rounded value, as from
 /// strtod.
-/// @return the place after the number, or null
-const char* parsePlainDecimal(const char* at, const char* end, float& value) {
-    const bool negative = at != end && *at == '-';
-    if (negative) ++at;
-    const char* const start = at;
+/// @return false if there is no such number
+bool takePlainDecimal(Rest& rest, float& value) {
+    static constexpr double kPowers[] = {1e0, 1e1, 1e2,  1e3,  1e4,  1e5,  1e6,  1e7,
+                                         1e8, 1e9, 1e10, 1e11, 1e12, 1e13, 1e14, 1e15};
+    const bool isNegative = rest.startsWith('-');
+    if (isNegative) ++rest.at;
     std::uint64_t digits = 0;
-    while (at != end && isDigit(*at))
-        digits = 10 * digits + static_cast<std::uint64_t>(*at++ - '0');
-    std::ptrdiff_t digitCount = at - start;
+    const char* const first = rest.at;
+    while (rest.at != rest.end && isDigit(*rest.at))
+        digits = 10 * digits + static_cast<std::uint64_t>(*rest.at++ - '0');
+    std::ptrdiff_t digitCount = rest.at - first;
     std::ptrdiff_t fractionDigits = 0;
-    if (at != end && *at == '.') {
-        const char* const fraction = ++at;
-        while (at != end && isDigit(*at)) {
-            digits = 10 * digits + static_cast<std::uint64_t>(*at++ - '0');
-        }
-        fractionDigits = at - fraction;
+    if (rest.startsWith('.')) {
+        ++rest.at;
+        fractionDigits = takeDigits(rest, digits);
         digitCount += fractionDigits;
     }
-    if (digitCount < 1 || digitCount > 15) return nullptr;
-    const double magnitude = static_cast<double>(digits) / kPowersOfTen[fractionDigits];
-    value = static_cast<float>(negative ? -magnitude : magnitude);
-    return at;
+    if (digitCount < 1 || digitCount > 15) return false;
+    const double magnitude =
+        static_cast<double>(static_cast<std::int64_t>(digits)) / kPowers[fractionDigits];
+    value = static_cast<float>(isNegative ? -magnitude : magnitude);
+    return true;
 }
 
 }  // namespace
@@ -76,20 +136,16 @@ std::int32_t toInt(std::string_view token) {
 }
 
 bool parsePlainTriple(std::string_view line, RGB& rgb) {
-    const char* at = line.data();
-    const char* const end = at + line.size();
+    Rest rest{line.data(), line.data() + line.size(), line.data()};
     float numbers[3];
-    for (float& number : numbers) {
-        while (at != end && isSeparator(*at))
-            ++at;
-        at = parsePlainDecimal(at, end, number);
-        if (at == nullptr) return false;
-        if (&number != &numbers[2] && (at == end || !isSeparator(*at))) return false;
+    for (int c = 0; c < 3; ++c) {
+        if (c > 0 && (rest.at == rest.end || !isSeparator(*rest.at))) return false;
+        rest.skipSeparators();
+        if (!takePlainDecimal(rest, numbers[c])) return false;
     }
-    if (at != end && *at == '\r' && at + 1 == end) ++at;
-    while (at != end && isSeparator(*at))
-        ++at;
-    if (at != end) return false;
+    if (rest.startsWith('\r') && rest.at + 1 == rest.end) ++rest.at;
+    rest.skipSeparators();
+    if (rest.at != rest.end) return false;
     rgb = RGB(numbers[0], numbers[1], numbers[2]);
     return true;
 }
