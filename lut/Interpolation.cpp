@@ -4,6 +4,7 @@
 #include <array>
 #include <cmath>
 #include <cstdint>
+#include <cstdlib>
 #include <limits>
 
 #include "lut/Exception.h"
@@ -19,7 +20,8 @@ public:
         if (lut.is1D()) throw Exception(wrongKind);
         sizes_ = {lut.width(), lut.height(), lut.depth()};
         samples_ = lut.data();
-        last_ = sizes_[0] * sizes_[1] * sizes_[2] - 1;
+        // Only with samples: two huge sides and a third of 0 would overflow.
+        if (!empty()) last_ = sizes_[0] * sizes_[1] * sizes_[2] - 1;
     }
 
     bool empty() const { return samples_ == nullptr; }
@@ -79,7 +81,7 @@ RGB TrilinearInterpolate(const LUT& lut, const RGB& point) {
     float weight[3][2];
     for (unsigned c = 0; c < 3; ++c) {
         const float x = latticePosition(lut, point, c);
-        const float lower = std::isnan(x) ? 0.0F : std::floor(x);
+        const float lower = std::floor(x);
         const int i = toInt32(lower);
         // Deliberate: only the upper index is clamped. At the upper face it falls onto the lower
         // one with weight 0, so that the face is exact.
@@ -230,39 +232,52 @@ RGB LinearStaggeredInterpolate(const LUT& lut, const RGB& point) {
     return result;
 }
 
+namespace {
+
+/// One channel of a list of triples, read within its bounds only.
+class Column {
+public:
+    Column(const RGB* entries, std::size_t entryCount, unsigned channel)
+        : floats_(entries->data_block() + channel),
+          last_(static_cast<std::int64_t>(entryCount) - 1) {}
+
+    float operator[](std::int64_t i) const {
+        return floats_[3 * std::clamp<std::int64_t>(i, 0, last_)];
+    }
+
+private:
+    const float* floats_;
+    std::int64_t last_;
+};
+
+}  // namespace
+
 float interpolateCurve(const RGB* entries, std::size_t entryCount, unsigned channel, float points,
                        float t) {
-    const auto entry = [&](std::int64_t i) {
-        const auto last = static_cast<std::int64_t>(entryCount) - 1;
-        return entries[std::clamp<std::int64_t>(i, 0, last)][channel];
-    };
-    const int n = toInt32(points);
+    const Column column(entries, entryCount, channel);
+    const std::int64_t last = std::int64_t{toInt32(points)} - 1;
     const float x = t * (points - 1.0F);
-    const int i = toInt32(std::floor(x));
-    if (i < 0) return entry(0);
-    if (i >= std::int64_t{n} - 1) return entry(std::int64_t{n} - 1);
-    const float below = entry(i);
-    return below + (entry(std::int64_t{i} + 1) - below) * (x - static_cast<float>(i));
+    const std::int64_t i = toInt32(std::floor(x));
+    if (i < 0) return column[0];
+    if (i >= last) return column[last];
+    return column[i] + (column[i + 1] - column[i]) * (x - static_cast<float>(i));
 }
 
 namespace {
 
 /// Position from 0 to 1 of a value among the ascending breakpoints of one channel.
 float locate(const std::vector<RGB>& breakpoints, unsigned channel, float points, float value) {
-    const auto stored = static_cast<std::int64_t>(breakpoints.size());
-    const auto breakpoint = [&](std::int64_t i) {
-        return breakpoints[static_cast<std::size_t>(std::clamp<std::int64_t>(i, 0, stored - 1))]
-                          [channel];
-    };
+    const Column column(breakpoints.data(), breakpoints.size(), channel);
     const std::int64_t last = std::int64_t{toInt32(points)} - 1;
-    if (breakpoint(0) >= value) return 0.0F;
-    if (value >= breakpoint(last)) return 1.0F;
+    if (column[0] >= value) return 0.0F;
+    if (value >= column[last]) return 1.0F;
+    // A count may claim more than is stored; there is nothing to find beyond.
+    const auto stored = static_cast<std::int64_t>(breakpoints.size());
     std::int64_t i = 1;
-    while (i < std::min(last, stored) && !(breakpoint(i) > value))
+    while (i < std::min(last, stored) && !(column[i] > value))
         ++i;
-    const float below = breakpoint(i - 1);
-    return (static_cast<float>(i - 1) + (value - below) / (breakpoint(i) - below)) /
-           (points - 1.0F);
+    const float below = column[i - 1];
+    return (static_cast<float>(i - 1) + (value - below) / (column[i] - below)) / (points - 1.0F);
 }
 
 }  // namespace

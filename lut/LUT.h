@@ -29,7 +29,7 @@ using Transform = vnl_matrix_fixed<float, 4, 4>;
 /// A file's reader fills one, writers and evaluation only read it. Tables are handed on in a
 /// boost::shared_ptr<LUT> and never copied.
 ///
-/// Threads  const members may run at once; resize, and writing through get, may overlap nothing.
+/// Threads  const members may run at once; the others may overlap nothing.
 /// Binary   the order of the virtual functions and of the data members is what plug-ins were
 ///          compiled against: new ones go last.
 class LUT {
@@ -49,6 +49,7 @@ public:
     /// place in storage, new ones are zero; the same sizes again are no work at all.
     /// @throws Exception          "resize: not available" for a kind that cannot
     /// @throws std::length_error  a negative side, or more than 2^31 - 1 points; nothing changes
+    /// @throws std::bad_alloc     no memory; nothing changes
     virtual void resize(int n);
     virtual void resize(int width, int height, int depth);
 
@@ -77,8 +78,8 @@ public:
     /// The table's output for an input colour.
     ///
     /// A lattice applies the pre-LUT, then the mode's method; outside its domain it continues along
-    /// a straight line if extrapolate is set. A curve ignores mode and extrapolate and covers 0
-    /// to 1.
+    /// a straight line if extrapolate is set. A curve ignores the pre-LUT, the transform, mode and
+    /// extrapolate and covers 0 to 1. A table without samples gives zeros.
     /// @throws Exception "Unknown interpolation mode" for a lattice and a mode above Cubic
     virtual RGB interpolate(const RGB& point, InterpolationMode mode, bool extrapolate) const = 0;
 

@@ -52,6 +52,7 @@ RGB LUT3D::interpolate(const RGB& point, InterpolationMode mode, bool extrapolat
                                           TrilinearInterpolate, CubicInterpolate};
     if (mode > Cubic) throw Exception("Unknown interpolation mode");
     const Method method = kMethods[mode];
+    if (values.empty()) return RGB(0.0F, 0.0F, 0.0F);
 
     RGB min;
     RGB max;

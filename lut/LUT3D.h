@@ -9,7 +9,7 @@ namespace Orlith::LUT {
 /// Storage  red fastest: sample (r, g, b) is element (b * height + g) * width + r.
 /// Values   single precision, nominally 0 to 1, never clamped or rounded here.
 /// Domain   index i on channel c stands for the input i * scale_c + offset_c (see transform).
-/// Threads  const members may run at once; resize, and writing through get, may overlap nothing.
+/// Threads  const members may run at once; the others may overlap nothing.
 class LUT3D final : public LUT {
 public:
     LUT3D() = default;
@@ -29,7 +29,8 @@ public:
 
 private:
     std::size_t element(int r, int g, int b) const {
-        return static_cast<std::size_t>((b * height_ + g) * width_ + r);
+        const int place = (b * height_ + g) * width_ + r;
+        return static_cast<std::size_t>(place);
     }
 
     int width_ = 0;

@@ -21,6 +21,7 @@ public:
     /// Reads the named file into a new table, a LUT1D or a LUT3D.
     /// @throws Exception          the file cannot be opened or is not what the format says
     /// @throws std::length_error  the file declares a table that no lattice can hold
+    /// @throws std::bad_alloc     the table does not fit into memory
     virtual boost::shared_ptr<LUT> read(const std::string& filename) = 0;
 
     /// Options of the format. A name that is taken keeps its property; the result says so by false.

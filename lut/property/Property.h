@@ -47,7 +47,7 @@ public:
 
     PropertyTemplate(const PropertyTemplate& other)
         : Base(other), values(other.count), count(other.count) {
-        const auto kept = static_cast<std::ptrdiff_t>(std::min(other.size(), size()));
+        const auto kept = static_cast<std::ptrdiff_t>(std::min(other.values.size(), values.size()));
         std::copy(other.values.begin(), other.values.begin() + kept, values.begin());
     }
     PropertyTemplate& operator=(const PropertyTemplate&) = delete;

@@ -50,7 +50,7 @@ bool LineSource::fill() {
     end_ -= begin_;
     begin_ = 0;
     // A long line doubles the buffer, so that its bytes are not moved over and over.
-    const std::size_t wanted = std::min(std::max(kBlockBytes, 2 * end_), kLongestLine);
+    const std::size_t wanted = std::clamp(2 * end_, kBlockBytes, kLongestLine);
     if (buffer_.size() < wanted) buffer_.resize(wanted);
     text_.read(buffer_.data() + end_, static_cast<std::streamsize>(buffer_.size() - end_));
     const auto byteCount = static_cast<std::size_t>(text_.gcount());

@@ -11,8 +11,8 @@ namespace Orlith::LUT {
 /// The physical lines of a text, and the only place that counts them.
 class LineSource {
 public:
-    /// Longest line in bytes: a small compressed file can hold an enormous one. A longer line is
-    /// delivered cut, and nothing after it.
+    /// Longest line in bytes, its end included: a small compressed file can hold an enormous one.
+    /// Of a longer line this much is delivered, and nothing after it.
     static constexpr std::size_t kLongestLine = std::size_t{64} << 20;
 
     /// @param text        read from where it stands, in large blocks; outlives this object

@@ -43,8 +43,7 @@ LineWriter::~LineWriter() {
 }
 
 LineWriter& LineWriter::text(std::string_view text) {
-    std::memcpy(reserve(text.size()), text.data(), text.size());
-    length_ += text.size();
+    length_ += text.copy(reserve(text.size()), text.size());
     return *this;
 }
 
