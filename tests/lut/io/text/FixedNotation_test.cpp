@@ -1,0 +1,70 @@
+#include "lut/io/text/FixedNotation.h"
+
+#include <gtest/gtest.h>
+
+#include <cstdint>
+#include <cstdio>
+#include <cstring>
+#include <limits>
+#include <random>
+#include <string>
+
+namespace {
+
+namespace ol = Orlith::LUT;
+
+/// Compares with the C library; the tests run in the "C" locale.
+/// @return whether it was equal, so that a long loop stops at the first difference
+bool agreesWithPrintf(float value) {
+    char expected[64];
+    std::snprintf(expected, sizeof(expected), "%.6f", static_cast<double>(value));
+    char written[ol::kFixedLength];
+    const std::string_view actual(
+        written, static_cast<std::size_t>(ol::writeFixed(written, value) - written));
+    EXPECT_EQ(actual, expected) << std::hexfloat << value;
+    return actual == expected;
+}
+
+float floatOf(std::uint32_t bits) {
+    float value;
+    std::memcpy(&value, &bits, sizeof(value));
+    return value;
+}
+
+TEST(FixedNotation, AgreesWithPrintfOnRandomBits) {
+    std::mt19937 random;
+    for (int i = 0; i < 1000000; ++i)
+        ASSERT_TRUE(agreesWithPrintf(floatOf(static_cast<std::uint32_t>(random()))));
+}
+
+TEST(FixedNotation, AgreesWithPrintfFromZeroToOne) {
+    std::mt19937 random;
+    std::uniform_real_distribution<float> value(0.0F, 1.0F);
+    for (int i = 0; i < 200000; ++i)
+        ASSERT_TRUE(agreesWithPrintf(value(random)));
+}
+
+TEST(FixedNotation, AgreesWithPrintfOnEveryExponent) {
+    // Zeros, denormals, infinities and NaN among them.
+    for (std::uint32_t exponent = 0; exponent < 256; ++exponent) {
+        for (const std::uint32_t mantissa :
+             {0U, 1U, 2U, 0x2aaaaaU, 0x400000U, 0x7ffffeU, 0x7fffffU}) {
+            ASSERT_TRUE(agreesWithPrintf(floatOf(exponent << 23 | mantissa)));
+            ASSERT_TRUE(agreesWithPrintf(floatOf(0x80000000U | exponent << 23 | mantissa)));
+        }
+    }
+}
+
+TEST(FixedNotation, RoundsTiesToEven) {
+    // The odd multiples of 1/128 are the floats that lie half way between two texts.
+    for (int i = 1; i < 100000; i += 2) {
+        ASSERT_TRUE(agreesWithPrintf(static_cast<float>(i) / 128.0F));
+        ASSERT_TRUE(agreesWithPrintf(static_cast<float>(-i) / 128.0F));
+    }
+    char written[ol::kFixedLength];
+    EXPECT_EQ(std::string(written, ol::writeFixed(written, 1.0F / 128.0F)), "0.007812");
+    EXPECT_EQ(std::string(written, ol::writeFixed(written, 3.0F / 128.0F)), "0.023438");
+    EXPECT_EQ(std::string(written, ol::writeFixed(written, -0.0F)), "-0.000000");
+}
+
+}  // namespace
