@@ -23,7 +23,6 @@
 #include <algorithm>
 #include <boost/algorithm/string/case_conv.hpp>
 #include <boost/smart_ptr/make_shared.hpp>
-#include <cstring>
 #include <fstream>
 #include <locale>
 #include <stdexcept>
@@ -45,69 +44,34 @@ constexpr char kInputLUTError[] =
     "Truelight LUT reader: syntax error while reading pre-LUT data (too many or not enough "
     "values).";
 
-/// The samples of the cube in the order of the file, until the last width line is known.
-///
-/// A second width line resizes the table: samples keep their place in storage, and the position of
-/// the next one stays. Doing that to the table itself would copy, and so touch, whatever a small
-/// file claims, once for every such line.
-class CubeSamples {
+/// The cube, and where its next sample goes. A second width line resizes the table: samples keep
+/// their place in storage, and the position stays.
+class Cube {
 public:
-    explicit CubeSamples(LUT3D& lut) : lut_(lut) {}
+    explicit Cube(LUT3D& lut) : lut_(lut) {}
 
-    /// @throws std::length_error  no lattice can be of that size
     void resize(const LatticeSize& size) {
-        lut_.resize(0);
         lut_.resize(size.width, size.height, size.depth);
         size_ = size;
-        spans_.push_back({samples_.size(), size, next_, size.pointCount()});
+        samples_ = lut_.data();
     }
 
     void add(const RGB& rgb) {
         if (!next_.isInside(size_)) throw Exception(kCubeError);
-        samples_.push_back(rgb);
+        std::copy_n(rgb.data_block(), 3, samples_ + 3 * next_.element(size_));
         next_.advanceRedFastest(size_);
     }
 
-    /// Stores the samples in the table.
-    void place() {
-        // What one lattice has cut off does not come back with a larger one.
-        for (std::size_t i = spans_.size(); i-- > 1;) {
-            spans_[i - 1].reach = std::min(spans_[i - 1].reach, spans_[i].reach);
-        }
-        for (std::size_t i = 0; i < spans_.size(); ++i) {
-            place(spans_[i], i + 1 < spans_.size() ? spans_[i + 1].begin : samples_.size());
-        }
-    }
-
 private:
-    /// The samples between two width lines.
-    struct Span {
-        std::size_t begin;
-        LatticeSize size;
-        LatticePosition first;
-        std::size_t reach;  // places in storage that this and all later lattices have
-    };
-
-    void place(const Span& span, std::size_t end) {
-        float* const out = lut_.data();
-        LatticePosition position = span.first;
-        for (std::size_t i = span.begin; i < end; ++i) {
-            const std::size_t element = position.element(span.size);
-            if (element < span.reach) std::memcpy(out + 3 * element, &samples_[i], sizeof(RGB));
-            position.advanceRedFastest(span.size);
-        }
-    }
-
     LUT3D& lut_;
     LatticeSize size_;
     LatticePosition next_;
-    std::vector<RGB> samples_;
-    std::vector<Span> spans_;
+    float* samples_ = nullptr;
 };
 
 enum class Data { InputLUT, Cube };
 
-void readWidth(const Tokens& tokens, CubeSamples& cube) {
+void readWidth(const Tokens& tokens, Cube& cube) {
     if (tokens.count() != 5) throw Exception("Truelight LUT reader: expected 3 values for width.");
     cube.resize({toInt(tokens[2]), toInt(tokens[3]), toInt(tokens[4])});
 }
@@ -122,7 +86,7 @@ void readInputLUTLength(const Tokens& tokens, Shaper& inputLUT) {
 
 /// A keyword line: "#", keyword, values.
 /// @return false if nothing more is to be read
-bool readKeyword(const Tokens& tokens, LUT& lut, CubeSamples& cube, Data& data) {
+bool readKeyword(const Tokens& tokens, LUT& lut, Cube& cube, Data& data) {
     // Deliberate: lines are not trimmed, so a carriage return is part of the keyword that it
     // follows, which is then unknown. Held by TruelightReader.DoesNotKnowAKeywordWithAReturn.
     const std::string keyword =
@@ -158,7 +122,7 @@ boost::shared_ptr<LUT> LUTFileReaderTruelight::read(const std::string& filename)
 
     const auto lut = boost::make_shared<LUT3D>();
     lut_ = lut;
-    CubeSamples cube(*lut);
+    Cube cube(*lut);
     std::vector<RGB>& inputLUT = lut->outputShaper.entries;
     Data data = Data::Cube;
     std::string_view line;
@@ -184,7 +148,6 @@ boost::shared_ptr<LUT> LUTFileReaderTruelight::read(const std::string& filename)
     if (inputLUT.empty() && sampleCount_ == 0) {
         throw Exception("Truelight LUT reader: syntax error while reading LUT data.");
     }
-    cube.place();
     // An input LUT leads from inputs to lattice positions by itself: identity.
     if (inputLUT.empty()) setUnitDomain(*lut, lut->width(), lut->height(), lut->depth());
     return lut;

@@ -66,8 +66,6 @@ void expectValues(const Tokens& words, std::size_t valueCount, const char* messa
 void readParameter(const Tokens& words, LUT3D& lut, Placement& placement) {
     if (words[0] == "grid_size") {
         expectValues(words, 3, "VF file reader: expecting 3 values for grid_size.");
-        // Emptied first: a second size would copy, and so touch, all of a huge empty lattice.
-        lut.resize(0);
         lut.resize(toInt(words[1]), toInt(words[2]), toInt(words[3]));
     } else if (words[0] == "element_size") {
         expectValues(words, 3, "VF file reader: expecting 3 values for element_size.");

@@ -159,6 +159,22 @@ TEST(LUT, CostsNoMemoryForSamplesThatNobodyStored) {
     expectRGB(*(&lut.get(0, 0, 0) + element), 1.0F, 2.0F, 3.0F);
 }
 
+TEST(LUT, ClearsWhatAShrunkTableLeftBehind) {
+    // Heap blocks, pages, and from one to the other and back; 87,382 samples are 1 MiB.
+    const int counts[][2] = {
+        {10, 3}, {200'000, 150'001}, {200'000, 87'383}, {200'000, 10}, {1'000'000, 87'381}};
+    for (const auto& [larger, smaller] : counts) {
+        SCOPED_TRACE(std::to_string(larger) + " to " + std::to_string(smaller));
+        const auto curve = markedCurve(larger);
+        curve->resize(smaller);
+        curve->resize(larger);
+        expectRGB(curve->get(smaller - 1), markedSample(smaller - 1, 0, 0));
+        const float* const cleared = curve->data() + 3 * smaller;
+        const float* const end = curve->data() + 3 * larger;
+        EXPECT_EQ(std::find_if(cleared, end, [](float value) { return value != 0.0F; }), end);
+    }
+}
+
 TEST(LUT, TellsItsDomain) {
     ol::RGB min;
     ol::RGB max;

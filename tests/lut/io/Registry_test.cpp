@@ -2,8 +2,20 @@
 
 #include <gtest/gtest.h>
 
+#include "lut/io/LUTFileReader3DL.h"
+#include "lut/io/LUTFileReaderBLUT.h"
+#include "lut/io/LUTFileReaderCMS.h"
+#include "lut/io/LUTFileReaderCSP.h"
 #include "lut/io/LUTFileReaderIridas.h"
+#include "lut/io/LUTFileReaderTruelight.h"
+#include "lut/io/LUTFileReaderVF.h"
+#include "lut/io/LUTFileWriter3DL.h"
+#include "lut/io/LUTFileWriterBLUT.h"
+#include "lut/io/LUTFileWriterCMS.h"
+#include "lut/io/LUTFileWriterCSP.h"
 #include "lut/io/LUTFileWriterIridas.h"
+#include "lut/io/LUTFileWriterTruelight.h"
+#include "lut/io/LUTFileWriterVF.h"
 #include "tests/support/Tables.h"
 
 namespace {
@@ -39,6 +51,14 @@ constexpr char kNoWriter[] = "No writer found for extension \"%s\".";
 constexpr Row<ol::LUTFileReader> kReaders[] = {
     reads<ol::LUTFileReaderIridas>(".cube"),
     reads<ol::LUTFileReaderIridas>(".itx"),
+    reads<ol::LUTFileReaderTruelight>(".cub"),
+    reads<ol::LUTFileReader3DL>(".3dl"),
+    reads<ol::LUTFileReaderVF>(".vf"),
+    reads<ol::LUTFileReaderVF>(".gz"),
+    reads<ol::LUTFileReaderVF>(".vfz"),
+    reads<ol::LUTFileReaderCSP>(".csp"),
+    reads<ol::LUTFileReaderCMS>(".cms"),
+    reads<ol::LUTFileReaderBLUT>(".blut"),
     {".icc", nullptr, "reader not found"},
     {".CUBE", nullptr, kNoReader},
     {".cubes", nullptr, kNoReader},
@@ -48,6 +68,14 @@ constexpr Row<ol::LUTFileReader> kReaders[] = {
 
 constexpr Row<ol::LUTFileWriter> kWriters[] = {
     writes<ol::LUTFileWriterIridas>(".cube"),
+    writes<ol::LUTFileWriter3DL>(".3dl"),
+    writes<ol::LUTFileWriterVF>(".vf"),
+    writes<ol::LUTFileWriterVF>(".gz"),
+    writes<ol::LUTFileWriterVF>(".vfz"),
+    writes<ol::LUTFileWriterCSP>(".csp"),
+    writes<ol::LUTFileWriterTruelight>(".cub"),
+    writes<ol::LUTFileWriterCMS>(".cms"),
+    writes<ol::LUTFileWriterBLUT>(".blut"),
     {".itx", nullptr, kNoWriter},
     {".icc", nullptr, "writer not found"},
     {".CUBE", nullptr, kNoWriter},
