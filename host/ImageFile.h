@@ -10,6 +10,8 @@
 
 namespace host {
 
+class ImageReader;
+
 /// An image file that is read as float red, green and blue.
 ///
 /// Rows     counted upward: row 0 is the last line of the file's display window. Columns are those
@@ -34,16 +36,14 @@ public:
     void copyRow(int y, int x, int r, zefra::ChannelMask channels, zefra::Row& row);
 
 private:
-    struct Source;  // the open file; gone once its pixels are here
-
     void readPixels();
 
     std::string path_;
     std::filesystem::file_time_type time_;
     std::uintmax_t byteCount_ = 0;
     zefra::Box box_;
-    std::unique_ptr<Source> source_;
-    std::unique_ptr<float[]> pixels_;  // r g b; the file's first line first
+    std::unique_ptr<ImageReader> source_;  // gone once its pixels are here
+    std::unique_ptr<float[]> pixels_;      // r g b; the file's first line first
 };
 
 /// Writes an image row by row: float where the format holds it, otherwise 16-bit integers, or the

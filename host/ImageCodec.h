@@ -1,0 +1,75 @@
+#pragma once
+
+#include <memory>
+#include <string>
+
+#include "zefra/Export.h"
+
+// What the host needs of a library for image files. That library brings hundreds of others with it,
+// so it is in a module of its own, which is loaded when the first image is opened or written.
+
+namespace host {
+
+/// A rectangle of pixels: its top left one and its size. Lines are counted downward.
+struct ImageWindow {
+    int x = 0;
+    int y = 0;
+    int width = 0;
+    int height = 0;
+};
+
+/// Where an image is.
+struct ImageFrame {
+    ImageWindow data;     ///< the pixels that the file has
+    ImageWindow display;  ///< the picture that they are part of; empty if the file does not say
+};
+
+/// An open image file with at least three channels. Nothing else that it claims has been checked.
+class ImageReader {
+public:
+    virtual ~ImageReader() = default;
+
+    virtual const ImageFrame& frame() const = 0;
+
+    /// Fills the data window: triples red, green, blue, the first line first.
+    /// @throws Error  if the pixels cannot be read whole
+    virtual void readPixels(float* rgb) = 0;
+};
+
+/// An image file that is being written; removed at the end unless it is finished.
+class ImageWriter {
+public:
+    virtual ~ImageWriter() = default;
+
+    /// Writes the next line of the data window, triples red, green, blue.
+    /// @throws Error
+    virtual void writeLine(const float* rgb) = 0;
+
+    /// Closes the file after its last line.
+    /// @throws Error  if it could not be written whole
+    virtual void finish() = 0;
+};
+
+class ImageCodec {
+public:
+    virtual ~ImageCodec() = default;
+
+    /// Reads what a file says about itself.
+    /// @throws Error  with path and reason
+    virtual std::unique_ptr<ImageReader> open(const std::string& path) const = 0;
+
+    /// Starts a file in the format of its extension: float where the format holds it, otherwise
+    /// 16-bit integers, or the most that the format has.
+    /// @throws Error  with path and reason
+    virtual std::unique_ptr<ImageWriter> create(const std::string& path,
+                                                const ImageFrame& frame) const = 0;
+};
+
+/// The codec that goes with the running program. The first call loads it, and it stays loaded.
+/// @throws Error  with the loader's reason
+const ImageCodec& imageCodec();
+
+}  // namespace host
+
+/// What the module exports; never null.
+extern "C" ZEFRA_EXPORT const host::ImageCodec* orlithImageCodec();

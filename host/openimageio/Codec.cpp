@@ -1,0 +1,32 @@
+#include "host/openimageio/Codec.h"
+
+#include "host/Error.h"
+#include "host/Text.h"
+
+namespace host::openimageio {
+namespace {
+
+class Codec final : public ImageCodec {
+public:
+    std::unique_ptr<ImageReader> open(const std::string& path) const override {
+        return openImage(path);
+    }
+    std::unique_ptr<ImageWriter> create(const std::string& path,
+                                        const ImageFrame& frame) const override {
+        return createImage(path, frame);
+    }
+};
+
+}  // namespace
+
+void fail(const std::string& path, const std::string& reason, const char* unexplained) {
+    const std::string line = firstLine(reason);
+    throw Error(path, line.empty() ? unexplained : line);
+}
+
+}  // namespace host::openimageio
+
+const host::ImageCodec* orlithImageCodec() {
+    static const host::openimageio::Codec codec;
+    return &codec;
+}

@@ -1,0 +1,112 @@
+#include <OpenImageIO/imageio.h>
+#include <OpenImageIO/strutil.h>
+#include <fmt/format.h>
+
+#include <algorithm>
+#include <array>
+#include <fstream>
+#include <iterator>
+#include <string_view>
+#include <utility>
+
+#include "host/Error.h"
+#include "host/openimageio/Codec.h"
+
+namespace host::openimageio {
+namespace {
+
+[[noreturn]] void failReading(const std::string& path, const std::string& reason) {
+    fail(path, reason, "is damaged or cut off");
+}
+
+void expectPlainImage(const OIIO::ImageSpec& spec, const std::string& path) {
+    if (spec.nchannels < 3) {
+        throw Error(path, fmt::format("needs red, green and blue channels, has {}",
+                                      std::max(spec.nchannels, 0)));
+    }
+    if (spec.deep || spec.depth > 1) throw Error(path, "is not a flat image");
+}
+
+ImageFrame frameOf(const OIIO::ImageSpec& spec) {
+    return {{spec.x, spec.y, spec.width, spec.height},
+            {spec.full_x, spec.full_y, spec.full_width, spec.full_height}};
+}
+
+/// The index of a channel that is called by its letter or its word, or -1.
+int findChannel(const OIIO::ImageSpec& spec, const char* letter, const char* word) {
+    for (std::size_t i = 0; i < spec.channelnames.size(); ++i) {
+        const std::string& name = spec.channelnames[i];
+        if (OIIO::Strutil::iequals(name, letter) || OIIO::Strutil::iequals(name, word)) {
+            return static_cast<int>(i);
+        }
+    }
+    return -1;
+}
+
+/// Where red, green and blue are among the file's channels.
+std::array<int, 3> findChannels(const OIIO::ImageSpec& spec) {
+    const std::array<int, 3> named = {findChannel(spec, "r", "red"),
+                                      findChannel(spec, "g", "green"),
+                                      findChannel(spec, "b", "blue")};
+    const bool areNamed = named[0] >= 0 && named[1] >= 0 && named[2] >= 0;
+    return areNamed ? named : std::array<int, 3>{0, 1, 2};
+}
+
+/// JPEG alone is decoded to a picture of any length: what is missing comes out grey. A whole file
+/// has its end marker, which coded data never contain, at its end or a little before.
+void expectWholeJPEG(const std::string& path) {
+    constexpr std::streamoff kTailBytes = 65536;
+    std::ifstream file(path, std::ios::binary | std::ios::ate);
+    file.seekg(-std::min<std::streamoff>(file.tellg(), kTailBytes), std::ios::end);
+    const std::string tail{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+    if (tail.find("\xff\xd9") == std::string::npos) throw Error(path, "is cut off");
+}
+
+class Reader final : public ImageReader {
+public:
+    explicit Reader(const std::string& path) : path_(path) {
+        OIIO::ImageSpec wishes;
+        wishes["oiio:UnassociatedAlpha"] = 1;  // colours as the file has them
+        input_ = OIIO::ImageInput::open(path_, &wishes);
+        if (!input_) failReading(path_, OIIO::geterror());
+        expectPlainImage(input_->spec(), path_);
+        frame_ = frameOf(input_->spec());
+        channels_ = findChannels(input_->spec());
+    }
+
+    const ImageFrame& frame() const override { return frame_; }
+
+    void readPixels(float* rgb) override {
+        if (std::string_view(input_->format_name()) == "jpeg") expectWholeJPEG(path_);
+        const auto [red, green, blue] = channels_;
+        if (green == red + 1 && blue == red + 2) {
+            readChannels(red, 3, rgb);
+        } else {
+            readChannels(red, 1, rgb);
+            readChannels(green, 1, rgb + 1);
+            readChannels(blue, 1, rgb + 2);
+        }
+    }
+
+private:
+    void readChannels(int first, int count, float* target) {
+        constexpr OIIO::stride_t kPixelBytes = 3 * sizeof(float);
+        if (!input_->read_image(0, 0, first, first + count, OIIO::TypeFloat, target, kPixelBytes) ||
+            input_->has_error()) {  // TIFF: strips that are not there, and still a good result
+            failReading(path_, input_->geterror());
+        }
+    }
+
+    const std::string path_;
+    std::unique_ptr<OIIO::ImageInput> input_;
+    ImageFrame frame_;
+    std::array<int, 3> channels_{};
+};
+
+}  // namespace
+
+std::unique_ptr<ImageReader> openImage(const std::string& path) {
+    return std::make_unique<Reader>(path);
+}
+
+}  // namespace host::openimageio

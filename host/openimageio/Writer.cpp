@@ -1,0 +1,130 @@
+#include <OpenImageIO/filesystem.h>
+#include <OpenImageIO/imageio.h>
+
+#include <cerrno>
+#include <cstdio>
+#include <filesystem>
+#include <system_error>
+
+#include "host/Error.h"
+#include "host/openimageio/Codec.h"
+
+namespace host::openimageio {
+namespace {
+
+namespace fs = std::filesystem;
+
+[[noreturn]] void failWriting(const std::string& path, const std::string& reason) {
+    fail(path, reason, "cannot be written");
+}
+
+/// By another type name than "file", so that formats write through it: libjpeg, given the file
+/// itself, ends the program when the disk is full.
+class FileProxy final : public OIIO::Filesystem::IOFile {
+public:
+    using IOFile::IOFile;
+    const char* proxytype() const override { return "checked file"; }
+};
+
+/// The file beneath an image format. Several formats do not look whether their bytes arrive, so the
+/// file does; and it is removed if it was not written whole, unless it is a device.
+class OutputFile {
+public:
+    explicit OutputFile(const std::string& path) : path_(path) {}
+    OutputFile(const OutputFile&) = delete;
+    OutputFile& operator=(const OutputFile&) = delete;
+
+    ~OutputFile() {
+        proxy_.reset();
+        file_.reset();
+        std::error_code ignored;
+        if (isStarted_ && !isFinished_ && fs::is_regular_file(path_, ignored)) {
+            fs::remove(path_, ignored);
+        }
+    }
+
+    /// Opens the file for a format that writes through it.
+    OIIO::Filesystem::IOProxy* open() {
+        file_.reset(std::fopen(path_.c_str(), "w+b"));
+        if (!file_) throw Error(path_, std::generic_category().message(errno));
+        isStarted_ = true;
+        proxy_ = std::make_unique<FileProxy>(file_.get(), OIIO::Filesystem::IOProxy::Write);
+        return proxy_.get();
+    }
+
+    /// A format has opened the file by itself.
+    void started() { isStarted_ = true; }
+
+    /// The format is done.
+    void finish() {
+        proxy_.reset();
+        const bool hasFailed = file_ && std::ferror(file_.get()) != 0;
+        const bool isClosed = !file_ || std::fclose(file_.release()) == 0;
+        if (hasFailed || !isClosed) {
+            throw Error(path_, "cannot be written whole; the disk may be full");
+        }
+        isFinished_ = true;
+    }
+
+private:
+    struct Close {
+        void operator()(std::FILE* file) const { std::fclose(file); }
+    };
+    const std::string path_;
+    std::unique_ptr<std::FILE, Close> file_;
+    std::unique_ptr<FileProxy> proxy_;
+    bool isStarted_ = false;
+    bool isFinished_ = false;
+};
+
+OIIO::ImageSpec specOf(const ImageFrame& frame, const std::string& formatName) {
+    const bool holdsFloat = formatName == "openexr" || formatName == "tiff";
+    OIIO::ImageSpec spec(frame.data.width, frame.data.height, 3,
+                         holdsFloat ? OIIO::TypeFloat : OIIO::TypeUInt16);
+    spec.x = frame.data.x;
+    spec.y = frame.data.y;
+    spec.full_x = frame.display.x;
+    spec.full_y = frame.display.y;
+    spec.full_width = frame.display.width;
+    spec.full_height = frame.display.height;
+    return spec;
+}
+
+class Writer final : public ImageWriter {
+public:
+    Writer(const std::string& path, const ImageFrame& frame)
+        : path_(path), line_(frame.data.y), file_(path) {
+        format_ = OIIO::ImageOutput::create(path_);
+        if (!format_) failWriting(path_, OIIO::geterror());
+        if (format_->supports("ioproxy")) format_->set_ioproxy(file_.open());
+        if (!format_->open(path_, specOf(frame, format_->format_name()))) {
+            failWriting(path_, format_->geterror());
+        }
+        file_.started();
+    }
+
+    void writeLine(const float* rgb) override {
+        if (!format_->write_scanline(line_++, 0, OIIO::TypeFloat, rgb)) {
+            failWriting(path_, format_->geterror());
+        }
+    }
+
+    void finish() override {
+        if (!format_->close()) failWriting(path_, format_->geterror());
+        file_.finish();
+    }
+
+private:
+    const std::string path_;
+    int line_;  // the next one
+    OutputFile file_;
+    std::unique_ptr<OIIO::ImageOutput> format_;  // uses the file to its own end
+};
+
+}  // namespace
+
+std::unique_ptr<ImageWriter> createImage(const std::string& path, const ImageFrame& frame) {
+    return std::make_unique<Writer>(path, frame);
+}
+
+}  // namespace host::openimageio
