@@ -52,7 +52,7 @@ bool PatternSize::indexToColour(int index, float (&rgb)[3]) const {
 
 boost::shared_ptr<Orlith::LUT::LUT3D> analyseFrame(const PatternSize& size, const PreLUT& preLUT,
                                                    Frame& frame) {
-    const auto lut = boost::make_shared<Orlith::LUT::LUT3D>();
+    auto lut = boost::make_shared<Orlith::LUT::LUT3D>();
     lut->resize(size.lutSizeR, size.lutSizeG, size.lutSizeB);
     const auto fillRamp =
         preLUT.isLinear ? Orlith::LUT::fillLinearRamp : Orlith::LUT::fillSmoothRamp;

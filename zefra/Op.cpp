@@ -2,7 +2,6 @@
 
 #include <cstdarg>
 #include <cstdio>
-#include <vector>
 
 namespace zefra {
 
@@ -19,16 +18,13 @@ bool Op::knob_changed(const Control&) {
 }
 
 void Op::error(const char* format, ...) const {
+    // Long enough for any text of ours with a path in it; a longer one is cut.
+    char text[8192];
     va_list arguments;
     va_start(arguments, format);
-    va_list again;
-    va_copy(again, arguments);
-    const int length = std::vsnprintf(nullptr, 0, format, arguments);
+    std::vsnprintf(text, sizeof text, format, arguments);
     va_end(arguments);
-    std::vector<char> text(static_cast<std::size_t>(length < 0 ? 0 : length) + 1);
-    std::vsnprintf(text.data(), text.size(), format, again);
-    va_end(again);
-    node_.error(text.data());
+    node_.error(text);
 }
 
 }  // namespace zefra

@@ -13,6 +13,7 @@
 
 #include "lut/io/LUTFileReaderIridas.h"
 
+#include <algorithm>
 #include <boost/smart_ptr/make_shared.hpp>
 #include <fstream>
 
@@ -29,6 +30,9 @@ namespace {
 
 constexpr char kDataError[] = "Iridas LUT reader: syntax error while reading LUT data.";
 
+/// One more than a line of data has.
+constexpr std::size_t kMostWords = 4;
+
 /// The table of the latest size line, and where the next sample goes. A second size line replaces
 /// the table and leaves the position.
 class Target {
@@ -39,6 +43,7 @@ public:
         size_ = toInt(sizeToken);
         if (size_ <= 0) throw Exception("Iridas LUT reader: syntax error while reading LUT size.");
         lut_->resize(size_);
+        samples_ = lut_->data();
         return lut_;
     }
 
@@ -49,14 +54,14 @@ public:
     /// Stores a sample.
     /// @return false after the last entry of a curve
     bool store(const RGB& rgb) {
-        const bool inside = lut_->is1D() ? entry_ < size_ : point_.isInside(lattice());
-        if (!inside) throw Exception(kDataError);
-        if (lut_->is1D()) {
-            lut_->get(entry_) = rgb;
-            return ++entry_ < size_;
-        }
-        lut_->get(point_.r, point_.g, point_.b) = rgb;
-        point_.advanceRedFastest(lattice());
+        const LatticeSize lattice{size_, size_, size_};
+        const bool isCurve = lut_->is1D();
+        if (!(isCurve ? entry_ < size_ : point_.isInside(lattice))) throw Exception(kDataError);
+        const std::size_t element =
+            isCurve ? static_cast<std::size_t>(entry_) : point_.element(lattice);
+        std::copy_n(rgb.data_block(), 3, samples_ + 3 * element);
+        if (isCurve) return ++entry_ < size_;
+        point_.advanceRedFastest(lattice);
         return true;
     }
 
@@ -67,9 +72,8 @@ public:
     }
 
 private:
-    LatticeSize lattice() const { return {size_, size_, size_}; }
-
     boost::shared_ptr<LUT> lut_;
+    float* samples_ = nullptr;
     int size_ = 0;
     LatticePosition point_;
     int entry_ = 0;
@@ -99,7 +103,7 @@ boost::shared_ptr<LUT> LUTFileReaderIridas::read(const std::string& filename) {
     while (lines.next(line)) {
         const bool isPlain = parsePlainTriple(line, rgb);
         if (!isPlain) {
-            tokens.split(line);
+            tokens.split(line, kMostWords);
             if (isIgnored(tokens[0])) continue;
             if (isSize(tokens[0])) {
                 lut_ = target.start(tokens[0], tokens[1]);

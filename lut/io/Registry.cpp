@@ -2,6 +2,7 @@
 
 #include <boost/smart_ptr/make_shared.hpp>
 #include <string_view>
+#include <utility>
 
 #include "lut/Exception.h"
 #include "lut/io/LUTFileReader3DL.h"
@@ -49,9 +50,8 @@ constexpr Row<LUTFileWriter> writes(std::string_view extension) {
 // clang-format off
 constexpr Row<LUTFileReader> kReaders[] = {
     reads<LUTFileReaderIridas>(".cube"),
-    reads<LUTFileReaderIridas>(".cube"),   reads<LUTFileReaderIridas>(".itx"),
     reads<LUTFileReaderIridas>(".itx"),
-    reads<LUTFileReaderTruelight>(".cub"), {".icc", nullptr, "reader not found"},
+    reads<LUTFileReaderTruelight>(".cub"),
     reads<LUTFileReader3DL>(".3dl"),
     reads<LUTFileReaderVF>(".vf"),
     reads<LUTFileReaderVF>(".gz"),
@@ -111,9 +111,10 @@ void splitExtension(const std::string& path, std::string* base, std::string* ext
     const bool startsExtension = split != std::string::npos && path[split] == '.' && split > 0 &&
                                  kFolderEnds.find(path[split - 1]) == std::string_view::npos;
     if (!startsExtension) split = path.size();
-    const std::string whole = path;  // base or extension may be path itself
-    if (base != nullptr) *base = whole.substr(0, split);
-    if (extension != nullptr) *extension = whole.substr(split);
+    std::string name = path.substr(0, split);  // both first: either may go where path is
+    std::string suffix = path.substr(split);
+    if (base != nullptr) *base = std::move(name);
+    if (extension != nullptr) *extension = std::move(suffix);
 }
 
 }  // namespace Orlith::LUT

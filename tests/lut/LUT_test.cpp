@@ -169,8 +169,8 @@ TEST(LUT, ClearsWhatAShrunkTableLeftBehind) {
         curve->resize(smaller);
         curve->resize(larger);
         expectRGB(curve->get(smaller - 1), markedSample(smaller - 1, 0, 0));
-        const float* const cleared = curve->data() + 3 * smaller;
-        const float* const end = curve->data() + 3 * larger;
+        const float* const cleared = curve->data() + 3 * std::ptrdiff_t{smaller};
+        const float* const end = curve->data() + 3 * std::ptrdiff_t{larger};
         EXPECT_EQ(std::find_if(cleared, end, [](float value) { return value != 0.0F; }), end);
     }
 }

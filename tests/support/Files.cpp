@@ -20,7 +20,7 @@ TempFolder::~TempFolder() {
 }
 
 std::string TempFolder::write(const std::string& name, std::string_view bytes) const {
-    const std::string file = path(name);
+    std::string file = path(name);
     std::ofstream(file, std::ios::binary) << bytes;
     return file;
 }

@@ -31,6 +31,16 @@ char* writeInteger(char* out, int number) {
     return out + 4 - skipped;
 }
 
+/// Three numbers with a blank between them.
+template <class Number, class Write>
+char* writeTriple(char* out, const Number* rgb, Write write) {
+    out = write(out, rgb[0]);
+    *out++ = ' ';
+    out = write(out, rgb[1]);
+    *out++ = ' ';
+    return write(out, rgb[2]);
+}
+
 }  // namespace
 
 LineWriter::LineWriter(const std::string& filename, bool flushLines)
@@ -61,23 +71,13 @@ LineWriter& LineWriter::fixed(float number) {
 
 LineWriter& LineWriter::fixedTriple(const float* rgb) {
     char* const start = reserve(3 * kFixedLength + 2);
-    char* out = writeFixed(start, rgb[0]);
-    *out++ = ' ';
-    out = writeFixed(out, rgb[1]);
-    *out++ = ' ';
-    out = writeFixed(out, rgb[2]);
-    length_ += static_cast<std::size_t>(out - start);
+    length_ += static_cast<std::size_t>(writeTriple(start, rgb, writeFixed) - start);
     return *this;
 }
 
 LineWriter& LineWriter::integerTriple(const int* rgb) {
     char* const start = reserve(3 * kIntegerLength + 2);
-    char* out = writeInteger(start, rgb[0]);
-    *out++ = ' ';
-    out = writeInteger(out, rgb[1]);
-    *out++ = ' ';
-    out = writeInteger(out, rgb[2]);
-    length_ += static_cast<std::size_t>(out - start);
+    length_ += static_cast<std::size_t>(writeTriple(start, rgb, writeInteger) - start);
     return *this;
 }
 

@@ -12,6 +12,7 @@
 #include "lut/property/Property.h"
 #include "tests/support/Files.h"
 #include "tests/support/Tables.h"
+#include "tests/support/ThreeDL.h"
 
 namespace {
 
@@ -58,15 +59,19 @@ boost::shared_ptr<ol::LUT3D> makeTable() {
 
 TEST(Locale, DoesNotShowInTextFiles) {
     const TempFolder folder;
-    for (const std::string extension : {".cube"}) {
+    for (const std::string extension : {".3dl", ".cms", ".csp", ".cub", ".cube", ".vf"}) {
         SCOPED_TRACE(extension);
         const std::string plain = folder.path("plain" + extension);
         const std::string german = folder.path("german" + extension);
         const auto write = [](const std::string& path) {
-            ol::createWriter(path, false, "")->write(path, makeTable());
+            const auto writer = ol::createWriter(path, false, "");
+            Writing3DL{"lustre"}(*writer);  // options that other formats do not look at
+            writer->write(path, makeTable());
         };
         const auto read = [](const std::string& path) {
-            return ol::createReader(path, false, "")->read(path);
+            const auto reader = ol::createReader(path, false, "");
+            Reading3DL{}(*reader);
+            return reader->read(path);
         };
         write(plain);
         const auto expected = read(plain);
