@@ -1,0 +1,40 @@
+#pragma once
+
+#include <CLI/CLI.hpp>
+#include <stdexcept>
+#include <string>
+
+namespace orlith {
+
+/// Exit statuses of the program.
+enum Status : int { kDone = 0, kFailed = 1, kWrongUsage = 2, kCancelled = 130 };
+
+/// Ends a command with status 1 and its text on one line of standard error.
+class Failure : public std::runtime_error {
+public:
+    using std::runtime_error::runtime_error;
+};
+
+/// Ends a command with status 2.
+class UsageError : public std::runtime_error {
+public:
+    using std::runtime_error::runtime_error;
+};
+
+/// Ends a command with status 130.
+class Cancelled {};
+
+/// One line "orlith: warning: ..." on standard error.
+void warn(const std::string& text);
+
+// Each adds its command to the program; running it leaves the exit status in `status`.
+void addPattern(CLI::App& program, int& status);
+void addGenerate(CLI::App& program, int& status);
+void addConvert(CLI::App& program, int& status);
+void addInfo(CLI::App& program, int& status);
+void addEval(CLI::App& program, int& status);
+void addDiff(CLI::App& program, int& status);
+void addRun(CLI::App& program, int& status);
+void addPanel(CLI::App& program, int& status);
+
+}  // namespace orlith

@@ -1,0 +1,96 @@
+#include <fmt/format.h>
+
+#include <charconv>
+#include <iostream>
+#include <map>
+#include <string>
+#include <vector>
+
+#include "lut/io/text/Numbers.h"
+#include "lut/io/text/Tokens.h"
+#include "orlith/Command.h"
+#include "orlith/TableFile.h"
+
+namespace orlith {
+namespace {
+
+namespace ol = Orlith::LUT;
+
+struct EvalOptions {
+    std::string path;
+    ReadOptions reading;
+    ol::InterpolationMode mode = ol::Trilinear;
+    bool extrapolates = false;
+    std::vector<std::string> colour;
+};
+
+/// A whole word as a number. Results are compared by machines: a misspelt colour is no black.
+bool parseNumber(std::string_view word, float& number) {
+    if (!word.empty() && word.front() == '+') word.remove_prefix(1);
+    const auto [end, error] = std::from_chars(word.data(), word.data() + word.size(), number);
+    if (error == std::errc::invalid_argument || end != word.data() + word.size()) return false;
+    number = ol::toFloat(word);  // 0 or infinity for numbers that single precision does not hold
+    return true;
+}
+
+void evaluate(const ol::LUT& lut, const EvalOptions& options, const ol::RGB& colour) {
+    const ol::RGB result = lut.interpolate(colour, options.mode, options.extrapolates);
+    fmt::print("{}\n", colourText(result.data_block()));
+}
+
+void evaluateInput(const ol::LUT& lut, const EvalOptions& options) {
+    std::string line;
+    for (int number = 1; std::getline(std::cin, line); ++number) {
+        const ol::Tokens words(ol::trim(line));
+        if (words.empty()) continue;
+        ol::RGB colour;
+        bool isColour = words.count() == 3;
+        for (unsigned c = 0; isColour && c < 3; ++c)
+            isColour = parseNumber(words[c], colour[c]);
+        if (!isColour) {
+            throw Failure(fmt::format("standard input:{}: expected three numbers", number));
+        }
+        evaluate(lut, options, colour);
+    }
+}
+
+int runEval(const EvalOptions& options) {
+    ol::RGB colour;
+    for (unsigned c = 0; c < options.colour.size(); ++c) {
+        if (!parseNumber(options.colour[c], colour[c])) {
+            throw UsageError(fmt::format("\"{}\" is not a number", options.colour[c]));
+        }
+    }
+    const Table table = readTableAndWarn(options.path, options.reading);
+    if (options.colour.empty()) {
+        evaluateInput(*table.lut, options);
+    } else {
+        evaluate(*table.lut, options, colour);
+    }
+    return kDone;
+}
+
+}  // namespace
+
+void addEval(CLI::App& program, int& status) {
+    CLI::App* const command = program.add_subcommand(
+        "eval", "Send a colour, or each line of standard input, through a table");
+    const auto options = std::make_shared<EvalOptions>();
+    command->add_option("LUT", options->path, "Table to read")->required();
+    command->add_option("COLOUR", options->colour, "Red, green and blue")->expected(3);
+    addFromOption(*command, options->reading);
+    addReadOptions(*command, options->reading);
+    const std::map<std::string, ol::InterpolationMode> modes = {{"step", ol::Step},
+                                                                {"staggered", ol::LinearStaggered},
+                                                                {"trilinear", ol::Trilinear},
+                                                                {"cubic", ol::Cubic}};
+    command->add_option("--mode", options->mode, "Interpolation of a lattice (trilinear)")
+        ->transform(
+            CLI::Transformer(modes, CLI::ignore_case).description("step|staggered|trilinear|cubic"))
+        ->type_name("");
+    command->add_flag("--extrapolate", options->extrapolates,
+                      "Continue a lattice beyond its domain in straight lines");
+    command->callback([options, &status] { status = runEval(*options); });
+}
+
+}  // namespace orlith

@@ -1,0 +1,25 @@
+#pragma once
+
+#include <array>
+#include <string>
+
+#include "lut/LUT.h"
+
+namespace orlith {
+
+/// The input colour that a place of a table stands for: lattice point (r, g, b), or entry i of a
+/// curve on all three channels.
+Orlith::LUT::RGB inputColour(const Orlith::LUT::LUT& lut, int r, int g, int b);
+
+/// What the samples of a table say of it as a whole.
+struct Facts {
+    Orlith::LUT::RGB min;  ///< smallest and largest sample of each channel; NaN is passed over
+    Orlith::LUT::RGB max;
+    double identityDeviation = 0.0;  ///< largest distance of a sample from its
+                                     ///< input colour; infinite where there is a NaN
+    std::array<bool, 3> isMonotone = {true, true, true};  ///< each channel along its own axis
+};
+
+Facts factsOf(const Orlith::LUT::LUT& lut);
+
+}  // namespace orlith

@@ -1,0 +1,177 @@
+#include <fmt/format.h>
+
+#include <cmath>
+#include <cstdint>
+#include <nlohmann/json.hpp>
+#include <optional>
+#include <string>
+
+#include "orlith/Command.h"
+#include "orlith/Facts.h"
+#include "orlith/TableFile.h"
+
+namespace orlith {
+namespace {
+
+namespace ol = Orlith::LUT;
+
+constexpr std::uint64_t kMostValues = std::uint64_t{1} << 24;
+
+struct InfoOptions {
+    std::string path;
+    ReadOptions reading;
+    bool isJson = false;
+    bool showsValues = false;
+};
+
+/// Range and shape of the samples; none where the file did not fill the table, or it has no points.
+std::optional<Facts> facts(const Table& table) {
+    if (!table.isFilled() || table.pointCount == 0) return std::nullopt;
+    return factsOf(*table.lut);
+}
+
+// JSON
+
+/// A string; a byte of a file name that is no UTF-8 becomes the replacement character.
+std::string jsonText(const std::string& text) {
+    constexpr int kOneLine = -1;
+    return nlohmann::json(text).dump(kOneLine, ' ', false,
+                                     nlohmann::json::error_handler_t::replace);
+}
+
+/// The shortest digits that give the same float; JSON has no numbers for what is not finite.
+std::string jsonNumber(float number) {
+    if (std::isnan(number)) return "\"nan\"";
+    if (std::isinf(number)) return number > 0 ? "\"inf\"" : "\"-inf\"";
+    return fmt::format("{}", number);
+}
+
+std::string jsonTriple(const float* rgb) {
+    return fmt::format("[{}, {}, {}]", jsonNumber(rgb[0]), jsonNumber(rgb[1]), jsonNumber(rgb[2]));
+}
+
+std::string jsonRange(const ol::RGB& min, const ol::RGB& max) {
+    return fmt::format("{{\"min\": {}, \"max\": {}}}", jsonTriple(min.data_block()),
+                       jsonTriple(max.data_block()));
+}
+
+std::string jsonShaper(const ol::Shaper& shaper) {
+    if (shaper.empty()) return "null";
+    std::string entries;
+    for (const ol::RGB& entry : shaper.entries) {
+        if (!entries.empty()) entries += ", ";
+        entries += jsonTriple(entry.data_block());
+    }
+    return fmt::format("{{\"counts\": {}, \"entries\": [{}]}}",
+                       jsonTriple(shaper.counts.data_block()), entries);
+}
+
+std::string jsonTransform(const ol::Transform& transform) {
+    std::string rows;
+    for (unsigned row = 0; row < 4; ++row) {
+        if (row > 0) rows += ", ";
+        rows += fmt::format("[{}, {}, {}, {}]", jsonNumber(transform[row][0]),
+                            jsonNumber(transform[row][1]), jsonNumber(transform[row][2]),
+                            jsonNumber(transform[row][3]));
+    }
+    return "[" + rows + "]";
+}
+
+void printJson(const Table& table, const InfoOptions& options) {
+    const ol::LUT& lut = *table.lut;
+    ol::RGB min;
+    ol::RGB max;
+    lut.minmax(min, max);
+    const auto found = facts(table);
+    const std::string size =
+        lut.is1D() ? fmt::format("[{}]", lut.width())
+                   : fmt::format("[{}, {}, {}]", lut.width(), lut.height(), lut.depth());
+    fmt::print("{{\"file\": {}, \"format\": {}, \"kind\": \"{}\", \"size\": {},\n",
+               jsonText(options.path), jsonText(table.extension), lut.is1D() ? "1D" : "3D", size);
+    fmt::print(" \"samples_read\": {},\n", table.samplesRead);
+    fmt::print(" \"transform\": {}, \"domain\": {},\n", jsonTransform(lut.transform),
+               jsonRange(min, max));
+    fmt::print(" \"inputShaper\": {}, \"outputShaper\": {},\n", jsonShaper(lut.inputShaper),
+               jsonShaper(lut.outputShaper));
+    fmt::print(" \"range\": {}", found ? jsonRange(found->min, found->max) : "null");
+    if (options.showsValues) {
+        fmt::print(",\n \"values\": [");
+        for (std::uint64_t i = 0; i < table.pointCount; ++i) {
+            fmt::print("{}{}", i == 0 ? "" : ", ", jsonTriple(lut.data() + 3 * i));
+        }
+        fmt::print("]");
+    }
+    fmt::print("}}\n");
+}
+
+// For a person
+
+std::string triple(const ol::RGB& rgb) {
+    return colourText(rgb.data_block());
+}
+
+void printShaper(const char* name, const ol::Shaper& shaper) {
+    if (shaper.empty()) return;
+    fmt::print("{:<16}{} entries, counts {}, from {} to {}\n", name, shaper.entries.size(),
+               triple(shaper.counts), triple(shaper.entries.front()),
+               triple(shaper.entries.back()));
+}
+
+void printText(const Table& table, const InfoOptions& options) {
+    const ol::LUT& lut = *table.lut;
+    ol::RGB min;
+    ol::RGB max;
+    lut.minmax(min, max);
+    const auto line = [](const char* name, const std::string& value) {
+        fmt::print("{:<16}{}\n", name, value);
+    };
+    line("file", options.path);
+    line("format", table.extension);
+    line("table", fmt::format("{}, {}", lut.is1D() ? "1D" : "3D", sizeText(lut)));
+    line("samples read", fmt::format("{}", table.samplesRead));
+    line("domain", fmt::format("{} to {}", triple(min), triple(max)));
+    printShaper("input shaper", lut.inputShaper);
+    printShaper("output shaper", lut.outputShaper);
+    if (const auto found = facts(table)) {
+        const auto yesNo = [](bool yes) { return yes ? "yes" : "no"; };
+        line("range", fmt::format("{} to {}", triple(found->min), triple(found->max)));
+        line("from identity", fmt::format("{:.6g} at most", found->identityDeviation));
+        line("monotone", fmt::format("red {}, green {}, blue {}", yesNo(found->isMonotone[0]),
+                                     yesNo(found->isMonotone[1]), yesNo(found->isMonotone[2])));
+    } else {
+        line("range", "unknown: the file does not fill the table");
+    }
+    if (!options.showsValues) return;
+    for (std::uint64_t i = 0; i < table.pointCount; ++i) {
+        fmt::print("{}\n", colourText(lut.data() + 3 * i));
+    }
+}
+
+int runInfo(const InfoOptions& options) {
+    const Table table = readTableAndWarn(options.path, options.reading);
+    if (options.showsValues && table.pointCount > kMostValues) {
+        throw Failure(fmt::format("{}: {} points are too many for --values (at most {})",
+                                  options.path, table.pointCount, kMostValues));
+    }
+    if (options.isJson) {
+        printJson(table, options);
+    } else {
+        printText(table, options);
+    }
+    return kDone;
+}
+
+}  // namespace
+
+void addInfo(CLI::App& program, int& status) {
+    CLI::App* const command = program.add_subcommand("info", "Say what a table file holds");
+    const auto options = std::make_shared<InfoOptions>();
+    command->add_option("LUT", options->path, "Table to read")->required();
+    addFromOption(*command, options->reading);
+    addReadOptions(*command, options->reading);
+    command->add_flag("--json", options->isJson, "Print one JSON object");
+    command->add_flag("--values", options->showsValues, "Print all samples, in storage order");
+    command->callback([options, &status] { status = runInfo(*options); });
+}
+
+}  // namespace orlith

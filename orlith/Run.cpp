@@ -1,0 +1,90 @@
+#include <fmt/format.h>
+
+#include <filesystem>
+#include <fstream>
+#include <iterator>
+
+#include "host/Host.h"
+#include "host/ProgressDisplay.h"
+#include "orlith/Cancellation.h"
+#include "orlith/Command.h"
+
+namespace orlith {
+namespace {
+
+struct RunOptions {
+    std::string script;
+    std::vector<std::string> presses;
+};
+
+std::string readScript(const std::string& path) {
+    if (std::filesystem::is_directory(path)) throw Failure(path + ": is a folder");
+    std::ifstream file(path, std::ios::binary);
+    const std::string text{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+    if (!file || file.bad()) throw Failure(path + ": cannot be read");
+    return text;
+}
+
+/// All that the nodes have to say, each line with its node's name, which the host's own have.
+std::vector<std::string> takeErrors(const host::Host& host) {
+    std::vector<std::string> texts;
+    for (const auto& node : host.nodes()) {
+        for (const std::string& error : node->takeErrors()) {
+            const std::string place = node->name() + ": ";
+            texts.push_back(error.rfind(place, 0) == 0 ? error : place + error);
+        }
+    }
+    return texts;
+}
+
+void press(host::Host& host, const std::string& target) {
+    const std::size_t split = target.rfind('.');
+    if (split == std::string::npos || split == 0) {
+        throw UsageError(fmt::format("--press: \"{}\" has to be NODE.CONTROL", target));
+    }
+    host::Node* const node = host.findNode(target.substr(0, split));
+    if (node == nullptr) {
+        throw UsageError(fmt::format("--press: no node \"{}\"", target.substr(0, split)));
+    }
+    host::ProgressDisplay progress;
+    for (const auto& each : host.nodes())
+        each->setProgress(&progress);
+    host.press(*node, target.substr(split + 1));
+    for (const auto& each : host.nodes())
+        each->setProgress(nullptr);
+}
+
+int runRun(const RunOptions& options) {
+    const CancelScope scope;
+    host::Host host;
+    host.loadBundles();
+    host.runScript(readScript(options.script), options.script);
+    for (const std::string& text : takeErrors(host))
+        warn(text);
+    for (const std::string& target : options.presses) {
+        press(host, target);
+        if (host::Host::cancelRequested()) throw Cancelled();
+        if (const auto errors = takeErrors(host); !errors.empty()) {
+            throw Failure(fmt::format("{}", fmt::join(errors, "; ")));
+        }
+    }
+    return kDone;
+}
+
+}  // namespace
+
+void addRun(CLI::App& program, int& status) {
+    CLI::App* const command =
+        program.add_subcommand("run", "Load a script of saved nodes and press buttons");
+    const auto options = std::make_shared<RunOptions>();
+    command->add_option("SCRIPT", options->script, "Saved nodes (Tcl)")->required();
+    command
+        ->add_option(
+            "--press", options->presses,
+            "Button to press; may be given again. NODE is a name, or a class with one node")
+        ->type_name("NODE.CONTROL")
+        ->allow_extra_args(false);
+    command->callback([options, &status] { status = runRun(*options); });
+}
+
+}  // namespace orlith

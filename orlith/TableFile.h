@@ -1,0 +1,59 @@
+#pragma once
+
+#include <CLI/CLI.hpp>
+#include <boost/smart_ptr/shared_ptr.hpp>
+#include <cstdint>
+#include <string>
+
+#include "lut/LUT.h"
+
+namespace orlith {
+
+/// How a table file is read: --from and the options of .3dl files, which others ignore.
+struct ReadOptions {
+    std::string from;  ///< extension with its dot; empty: the file's own
+    bool hasFromOption = false;
+    std::string format3DL = "auto";
+    int outputBitDepth = kDetect;
+    bool normalizeOutput = false;
+
+    static constexpr int kDetect = -2;
+    static constexpr int kAsInput = -1;
+};
+
+void addFromOption(CLI::App& command, ReadOptions& options);
+void addReadOptions(CLI::App& command, ReadOptions& options);
+
+/// A table and what its file said of it.
+struct Table {
+    boost::shared_ptr<Orlith::LUT::LUT> lut;
+    std::string extension;
+    std::uint64_t samplesRead = 0;
+    std::uint64_t pointCount = 0;  ///< of the table
+
+    bool isFilled() const { return samplesRead >= pointCount; }
+};
+
+/// Reads a table without a word about what the file lacks.
+/// @throws Failure  the file's name, the line, and the library's message
+Table readTable(const std::string& path, const ReadOptions& options);
+
+/// Reads a table, and warns where its file held fewer or more samples than it has points.
+Table readTableAndWarn(const std::string& path, const ReadOptions& options);
+
+/// Points of a table.
+std::uint64_t pointCount(const Orlith::LUT::LUT& lut);
+
+/// Size as people write it: "33 x 33 x 33 points", or "1024 entries".
+std::string sizeText(const Orlith::LUT::LUT& lut);
+
+/// Three floats with the digits that give the same ones again; NaN has no sign.
+std::string colourText(const float* rgb);
+
+/// An extension as the library wants it: with its dot.
+std::string withDot(const std::string& extension);
+
+/// The format of a path: its own extension, unless one is given.
+std::string formatOf(const std::string& path, const std::string& givenExtension);
+
+}  // namespace orlith

@@ -1,0 +1,146 @@
+#include "orlith/Verification.h"
+
+#include <fmt/format.h>
+
+#include <algorithm>
+#include <cmath>
+#include <optional>
+
+#include "orlith/Command.h"
+#include "orlith/TableFile.h"
+
+namespace orlith {
+namespace {
+
+namespace ol = Orlith::LUT;
+
+constexpr int kWidestBLUT = 127;  // its size byte is read as a signed number
+
+/// Half a unit of the sixth digit, and the roundings of a float on its way through text.
+double textTolerance(double value) {
+    return 0.5e-6 + std::fabs(value) * 1.2e-7;
+}
+
+bool isSame(float a, float b) {
+    return a == b || (std::isnan(a) && std::isnan(b));
+}
+
+/// The code that a .3dl writer aims at for a value, before rounding.
+double codeOf(double value, const Options3DL& options) {
+    const double codeMax = std::ldexp(1.0, options.outputBits) - 1.0;
+    double code =
+        value * codeMax * static_cast<double>(options.scale) + static_cast<double>(options.offset);
+    if (std::isnan(code)) code = 0.0;
+    code = std::clamp(code, -2147483648.0, 2147483647.0);
+    return options.clampOutput ? std::clamp(code, 0.0, codeMax) : code;
+}
+
+/// The code behind a value that a .3dl reader gave: it takes Scratch's own scale and offset off.
+double codeBehind(double value, const Options3DL& options) {
+    const double codeMax = std::ldexp(1.0, options.outputBits) - 1.0;
+    const bool isScratch = options.dialect == "scratch";
+    return value * codeMax * (isScratch ? static_cast<double>(0.97979796F) : 1.0) +
+           (isScratch ? 15.0 : 0.0);
+}
+
+bool agrees(float read, float written, const std::string& extension, const Options3DL& options) {
+    const auto readValue = static_cast<double>(read);
+    const auto writtenValue = static_cast<double>(written);
+    if (extension == ".3dl") {
+        const double code = codeOf(writtenValue, options);
+        // Half a code, and what single precision leaves of large ones.
+        return std::fabs(codeBehind(readValue, options) - code) <=
+               0.5 + 1e-6 * std::fabs(code) + 1e-4;
+    }
+    if (isSame(read, written)) return true;
+    return extension != ".blut" &&
+           std::fabs(readValue - writtenValue) <= textTolerance(writtenValue);
+}
+
+bool sameSize(const ol::LUT& a, const ol::LUT& b) {
+    if (a.is1D() != b.is1D() || a.width() != b.width()) return false;
+    return a.is1D() || (a.height() == b.height() && a.depth() == b.depth());
+}
+
+/// Compares the pre-LUT, where the format keeps the table's outputShaper as it is.
+void verifyPreLUT(const std::string& path, const std::string& extension, const ol::LUT& read,
+                  const ol::LUT& table) {
+    const bool isKept = extension == ".cub" || extension == ".cms";
+    if (!isKept) return;
+    const auto& written = table.outputShaper.entries;
+    const auto& found = read.outputShaper.entries;
+    // A .cms reader divides its pre-LUT by the points of a side.
+    const double unit = extension == ".cms" ? table.width() : 1.0;
+    bool agreesAll = found.size() == written.size();
+    for (std::size_t i = 0; agreesAll && i < written.size(); ++i) {
+        for (unsigned c = 0; c < 3; ++c) {
+            const auto value = static_cast<double>(written[i][c]);
+            const double back = static_cast<double>(found[i][c]) * unit;
+            const bool same = back == value || (std::isnan(back) && std::isnan(value));
+            agreesAll =
+                agreesAll && (same || std::fabs(back - value) <= textTolerance(value) * 2.0);
+        }
+    }
+    if (!agreesAll) throw Failure(path + ": read back, its pre-LUT differs from the table's");
+}
+
+Table readBack(const std::string& path, const ReadOptions& options) {
+    try {
+        return readTable(path, options);
+    } catch (const Failure& failure) {
+        throw Failure(
+            fmt::format("{} (while reading back what was written; disk full?)", failure.what()));
+    }
+}
+
+}  // namespace
+
+Verification verify(const std::string& path, const std::string& extension, const ol::LUT& table,
+                    const Options3DL& options) {
+    if (extension == ".blut" && table.width() > kWidestBLUT) {
+        return {false,
+                fmt::format("a .blut of more than {} points cannot be read back", kWidestBLUT),
+                0.0};
+    }
+    ReadOptions reading;
+    reading.from = extension;
+    reading.format3DL = options.dialect;
+    // A Lustre file says its bits itself, and the reader warns when it is told again.
+    reading.outputBitDepth =
+        options.dialect == "lustre" ? ReadOptions::kDetect : options.outputBits;
+    const Table back = readBack(path, reading);
+    if (!sameSize(*back.lut, table)) {
+        throw Failure(fmt::format("{}: read back, it has {} instead of {}", path,
+                                  sizeText(*back.lut), sizeText(table)));
+    }
+    if (back.samplesRead != back.pointCount) {
+        throw Failure(fmt::format("{}: read back, it holds {} samples instead of {} (disk full?)",
+                                  path, back.samplesRead, back.pointCount));
+    }
+    const float* const read = back.lut->data();
+    const float* const written = table.data();
+    Verification result;
+    for (std::uint64_t i = 0; i < 3 * back.pointCount; ++i) {
+        if (!agrees(read[i], written[i], extension, options)) {
+            throw Failure(fmt::format("{}: read back, sample {} is {} instead of {}", path, i / 3,
+                                      read[i], written[i]));
+        }
+        const double deviation =
+            std::fabs(static_cast<double>(read[i]) - static_cast<double>(written[i]));
+        if (deviation > result.largestDeviation) result.largestDeviation = deviation;
+    }
+    verifyPreLUT(path, extension, *back.lut, table);
+    result.isVerified = true;
+    return result;
+}
+
+std::string summary(const std::string& path, const std::string& extension, const ol::LUT& table,
+                    const Verification& verification) {
+    const std::string outcome =
+        verification.isVerified
+            ? fmt::format("largest deviation {:.2g}", verification.largestDeviation)
+            : fmt::format("not verified: {}", verification.reason);
+    return fmt::format("{}: {}, {}, {}\n", path, extension, sizeText(table), outcome);
+}
+
+}  // namespace orlith

@@ -1,0 +1,93 @@
+#include "orlith/WriteOptions.h"
+
+#include "lut/RampFill.h"
+
+namespace orlith {
+namespace {
+
+namespace ol = Orlith::LUT;
+namespace property = Orlith::Property;
+
+// As the operator has them: 97/99 in single precision, and the code of Scratch's black.
+constexpr double kScratchScale = 0.9797979593276978;
+constexpr double kScratchOffset = 15.0;
+
+constexpr int kDefaultPreLUTEntries = 1024;
+
+}  // namespace
+
+const std::vector<int>& bitDepths() {
+    static const std::vector<int> bits = {4, 8, 10, 12, 16};
+    return bits;
+}
+
+Options3DL WriteOptions::options3DL() const {
+    const bool isScratch = format3DL == "scratch";
+    Options3DL options;
+    options.inputBits = bitDepth;
+    options.outputBits = outputBitDepth == 0 ? bitDepth : outputBitDepth;
+    options.clampOutput = clampOutput;
+    options.dialect = format3DL;
+    options.scale = static_cast<float>(scale.value_or(isScratch ? kScratchScale : 1.0));
+    options.offset = static_cast<float>(offset.value_or(isScratch ? kScratchOffset : 0.0));
+    return options;
+}
+
+void addWriteOptions(CLI::App& command, WriteOptions& options) {
+    command.add_option("--bitdepth", options.bitDepth, "Bits of the input grid of a .3dl file")
+        ->check(CLI::IsMember(bitDepths()))
+        ->capture_default_str();
+    command
+        .add_option_function<std::string>(
+            "--output-bitdepth",
+            [&](const std::string& text) {
+                options.outputBitDepth = text == "input" ? 0 : std::stoi(text);
+            },
+            "Bits of the codes of a .3dl file, or input (default)")
+        ->check(CLI::IsMember({"input", "4", "8", "10", "12", "16"}))
+        ->type_name("BITS");
+    command.add_flag("--clamp-output,!--no-clamp-output", options.clampOutput,
+                     "Clamp the codes of a .3dl file to their bits (default)");
+    command.add_option("--format-3dl", options.format3DL, "Dialect of a .3dl file")
+        ->check(CLI::IsMember({"flame", "lustre", "scratch"}))
+        ->capture_default_str();
+    command.add_option("--scale", options.scale, "Multiplies the codes of a .3dl file");
+    command.add_option("--offset", options.offset, "Added to the codes of a .3dl file");
+    command
+        .add_option("--lut1d", options.lut1d,
+                    "Entries of a pre-LUT for a table that has none (1024)")
+        ->check(CLI::Range(2, 1 << 24));
+    command
+        .add_option("--style1d", options.style1d,
+                    "Ramp of that pre-LUT: linear or logarithmic (default)")
+        ->check(CLI::IsMember({"linear", "logarithmic"}));
+}
+
+void setWriterProperties(ol::LUTFileWriter& writer, const Options3DL& options) {
+    const auto set = [&](const char* name, auto property) { writer.setProperty(name, property); };
+    set("inputBitDepth", property::makeProperty<property::Int>("inputBitDepth", options.inputBits));
+    set("outputBitDepth",
+        property::makeProperty<property::Int>("outputBitDepth", options.outputBits));
+    set("clampOutput",
+        property::makeProperty<property::Int>("clampOutput", options.clampOutput ? 1 : 0));
+    set("format3DL", property::makeProperty<property::String>("format3DL", options.dialect));
+    set("scale",
+        property::makeProperty<property::Double>("scale", static_cast<double>(options.scale)));
+    set("offset",
+        property::makeProperty<property::Double>("offset", static_cast<double>(options.offset)));
+}
+
+void addPreLUT(ol::LUT& lut, const WriteOptions& options) {
+    if (!options.lut1d && !options.style1d) return;
+    if (!lut.inputShaper.empty() || !lut.outputShaper.empty()) return;
+    setPreLUT(lut, options.lut1d.value_or(kDefaultPreLUTEntries),
+              options.style1d.value_or("logarithmic"));
+    lut.outputShaper.counts.fill(static_cast<float>(lut.outputShaper.entries.size()));
+}
+
+void setPreLUT(ol::LUT& lut, int entryCount, const std::string& style) {
+    const auto fillRamp = style == "linear" ? ol::fillLinearRamp : ol::fillSmoothRamp;
+    fillRamp(lut.outputShaper.entries, entryCount, 1);
+}
+
+}  // namespace orlith
