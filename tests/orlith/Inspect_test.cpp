@@ -1,0 +1,191 @@
+// The commands that look at tables: info, eval and diff.
+
+#include "tests/orlith/Program.h"
+
+namespace {
+
+using test::Words;
+
+// A curve that is no number in one place and rises and falls in others.
+constexpr char kCurve[] = "LUT_1D_SIZE 3\n0 1 0\n0.1 0.25 nan\n1 0.5 inf\n";
+// Red and green swapped, blue bent: off the identity by at most 1.
+constexpr char kLattice[] =
+    "LUT_3D_SIZE 2\n"
+    "0 0 0.5\n0 1 0.5\n1 0 0.5\n1 1 0.5\n"
+    "0 0 0.25\n0 1 0.25\n1 0 0.25\n1 1 0.25\n";
+
+class InspectTest : public test::ProgramTest {};
+
+TEST_F(InspectTest, InfoTellsAPersonWhatIsInAFile) {
+    folder_.write("lattice.cube", kLattice);
+    EXPECT_EQ(output({"info", "lattice.cube"}),
+              "file            lattice.cube\n"
+              "format          .cube\n"
+              "table           3D, 2 x 2 x 2 points\n"
+              "samples read    8\n"
+              "domain          0 0 0 to 1 1 1\n"
+              "range           0 0 0.25 to 1 1 0.5\n"
+              "from identity   1 at most\n"
+              "monotone        red yes, green yes, blue yes\n");
+    folder_.write("curve", kCurve);
+    EXPECT_EQ(output({"info", "curve", "--from", "cube", "--values"}),
+              "file            curve\n"
+              "format          .cube\n"
+              "table           1D, 3 entries\n"
+              "samples read    3\n"
+              "domain          0 0 0 to 1 1 1\n"
+              "range           0 0.25 0 to 1 1 inf\n"
+              "from identity   inf at most\n"
+              "monotone        red yes, green no, blue no\n"
+              "0 1 0\n"
+              "0.1 0.25 nan\n"
+              "1 0.5 inf\n");
+}
+
+TEST_F(InspectTest, InfoPrintsOneJsonObject) {
+    // A name with a quote, a backslash, a line end, a letter of two bytes and a byte that is none.
+    const std::string name = "a\"\\\n\xc3\xa9\xff.csp";
+    folder_.write(name,
+                  "CSPLUTV100\n3D\n\n2\n0 1\n0 0.5\n3\n0 0.25 1\n0 1e-7 1\n2\n-inf 1\n0 nan\n\n"
+                  "1 1 2\n0.1 0.2 0.3\n-nan inf 16777216\n");
+    EXPECT_EQ(
+        output({"info", name, "--json", "--values"}),
+        "{\"file\": \"a\\\"\\\\\\n\xc3\xa9\xef\xbf\xbd.csp\", \"format\": \".csp\", \"kind\": "
+        "\"3D\", \"size\": [1, 1, 2],\n"
+        " \"samples_read\": 2,\n"
+        " \"transform\": [[\"inf\", 0, 0, 0], [0, \"inf\", 0, 0], [0, 0, 1, 0], [0, 0, 0, 1]],"
+        " \"domain\": {\"min\": [0, 0, 0], \"max\": [\"nan\", \"nan\", 1]},\n"
+        " \"inputShaper\": {\"counts\": [2, 3, 2], \"entries\": [[0, 0, \"-inf\"], [1, 0.25,"
+        " 1], [1, 1, 1]]}, \"outputShaper\": {\"counts\": [2, 3, 2], \"entries\": [[0, 0, 0],"
+        " [0.5, 1e-07, \"nan\"], [0.5, 1, \"nan\"]]},\n"
+        " \"range\": {\"min\": [0.1, 0.2, 0.3], \"max\": [0.1, \"inf\", 16777216]},\n"
+        " \"values\": [[0.1, 0.2, 0.3], [\"nan\", \"inf\", 16777216]]}\n");
+}
+
+TEST_F(InspectTest, InfoAnswersATinyFileWithAHugeClaimAtOnce) {
+    folder_.write("claim.cube", "LUT_3D_SIZE 1000\n0 0 0\n");
+    const std::string warning =
+        "orlith: warning: claim.cube: holds 1 samples, its table has 1000000000 points\n";
+    const test::Outcome json = run({"info", "claim.cube", "--json"});
+    EXPECT_EQ(json.status, 0);
+    EXPECT_EQ(json.err, warning);
+    EXPECT_NE(json.out.find("\"samples_read\": 1,\n"), std::string::npos);
+    EXPECT_NE(json.out.find("\"range\": null}\n"), std::string::npos);
+    expect({"info", "claim.cube", "--values"}, 1, "",
+           warning +
+               "orlith: error: claim.cube: 1000000000 points are too many for --values (at most"
+               " 16777216)\n");
+    expect({"eval", "claim.cube", "1", "1", "1"}, 0, "0 0 0\n", warning);
+    folder_.write("surplus.cub", "# width 1 1 1\n0 0 0\n1 1 1\n");
+    expect({"eval", "surplus.cub", "0", "0", "0"}, 0, "1 1 1\n",
+           "orlith: warning: surplus.cub: holds 2 samples, its table has 1 points\n");
+}
+
+TEST_F(InspectTest, InfoReadsA3dlFileAsItIsTold) {
+    const std::string codes =
+        "0 255 \n0 0 0\n0 0 300\n0 255 0\n0 0 0\n0 0 0\n0 0 0\n0 0 0\n255 0 0\n";
+    folder_.write("a.3dl", codes);
+    const struct {
+        Words options;
+        const char* range;
+    } kCases[] = {
+        {{}, "0 0 0 to 0.24926686 0.24926686 0.29325515"},  // 300 takes ten bits
+
+        {{"--read-output-bitdepth", "8", "--normalize-output"}, "0 0 0 to 0.85 0.85 1.0000001"},
+        {{"--read-output-bitdepth", "input", "--read-format-3dl", "scratch"},
+         "-0.060036387 -0.060036387 -0.060036387 to 0.9605822 0.9605822 1.1406913"},
+    };
+    for (const auto& each : kCases) {
+        Words arguments = {"info", "a.3dl"};
+        arguments.insert(arguments.end(), each.options.begin(), each.options.end());
+        EXPECT_NE(output(arguments).find(std::string("range           ") + each.range + "\n"),
+                  std::string::npos)
+            << output(arguments);
+    }
+}
+
+TEST_F(InspectTest, EvalSendsColoursThroughATable) {
+    folder_.write("a.cube", kLattice);
+    const struct {
+        Words arguments;
+        const char* out;
+    } kCases[] = {
+        {{"0.25", "0.5", "0.5"}, "0.5 0.25 0.375\n"},
+        {{"0.25", "0.75", "1", "--mode", "step"}, "0 0 0.25\n"},
+        {{"0.25", "0.5", "0.5", "--mode", "staggered"}, "0.5 0.25 0.25\n"},
+
+        {{"--extrapolate", "-0.5", "0", "0"}, "0 -0.5 0.5\n"},
+        {{"1e-60", "+1", "0x1"}, nullptr},
+        {{"1e-60", "+1", "1e60"}, "nan nan nan\n"},
+    };
+    for (const auto& each : kCases) {
+        Words arguments = {"eval", "a.cube"};
+        arguments.insert(arguments.end(), each.arguments.begin(), each.arguments.end());
+        if (each.out == nullptr) {
+            expect(arguments, 2, "", "orlith: error: \"0x1\" is not a number\n");
+        } else {
+            EXPECT_EQ(output(arguments), each.out) << ::testing::PrintToString(each.arguments);
+        }
+    }
+}
+
+TEST_F(InspectTest, EvalReadsColoursFromStandardInput) {
+    folder_.write("a.cube", kLattice);
+    EXPECT_EQ(output({"eval", "a.cube"}, ""), "");
+    EXPECT_EQ(output({"eval", "a.cube"}, "0 0 0\r\n\n \t1\t0.25 +1e0 \n-1 5 nan"),
+              "0 0 0.5\n0.25 1 0.25\nnan nan nan\n");
+    for (const std::string line : {"1 2", "1 2 3 4", "1 2 3x"}) {
+        const test::Outcome outcome = run({"eval", "a.cube"}, "0 0 0\n\n" + line + "\n1 1 1\n");
+        EXPECT_EQ(outcome.status, 1) << line;
+        EXPECT_EQ(outcome.out, "0 0 0.5\n");
+        EXPECT_EQ(outcome.err, "orlith: error: standard input:3: expected three numbers\n");
+    }
+}
+
+TEST_F(InspectTest, DiffComparesTables) {
+    folder_.write("a.cube", kLattice);
+    folder_.write("b.cube", test::replaced(kLattice, "0 0 0.25", "0.5 0 0.5"));
+    const std::string differences =
+        "               largest          mean           rms\n"
+        "red                0.5        0.0625      0.176777\n"
+        "green                0             0             0\n"
+        "blue              0.25       0.03125     0.0883883\n";
+    const std::string none =
+        "               largest          mean           rms\n"
+        "red                  0             0             0\n"
+        "green                0             0             0\n"
+        "blue                 0             0             0\n";
+    expect({"diff", "a.cube", "a.cube"}, 0, none, "");
+    expect({"diff", "a.cube", "b.cube"}, 1, differences, "");
+    expect({"diff", "a.cube", "b.cube", "--tolerance", "0.5"}, 0, differences, "");
+    expect({"diff", "a.cube", "b.cube", "--tolerance", "0.4999"}, 1, differences, "");
+
+    // Another size: at the points of the larger, 0 0.5 1, whichever comes first.
+    folder_.write("curve2.cube", "LUT_1D_SIZE 2\n0 0 0\n1 1 1\n");
+    folder_.write("curve3.cube", "LUT_1D_SIZE 3\n0 0 0\n0.5 0.5 0.75\n1 1 1\n");
+    const std::string bent =
+        "               largest          mean           rms\n"
+        "red                  0             0             0\n"
+        "green                0             0             0\n"
+        "blue              0.25     0.0833333      0.144338\n";
+    expect({"diff", "curve2.cube", "curve3.cube"}, 1, bent, "");
+    expect({"diff", "curve3.cube", "curve2.cube"}, 1, bent, "");
+    // A curve against a lattice: red and green swapped, blue between 0.5 and 0.25.
+    EXPECT_EQ(run({"diff", "a.cube", "curve2.cube", "--tolerance", "1"}).status, 0);
+    EXPECT_EQ(run({"diff", "a.cube", "curve2.cube", "--tolerance", "0.9"}).status, 1);
+
+    // No number equals no number, but nothing else.
+    folder_.write("nan.cube", "LUT_1D_SIZE 2\n0 0 0\n1 nan 1\n");
+    expect({"diff", "nan.cube", "nan.cube"}, 0, none, "");
+    const test::Outcome outcome = run({"diff", "nan.cube", "curve2.cube", "--tolerance", "9e99"});
+    EXPECT_EQ(outcome.status, 1);
+    EXPECT_NE(outcome.out.find("green              inf           inf           inf\n"),
+              std::string::npos)
+        << outcome.out;
+    expect({"diff", "a.cube", "none.cube"}, 1, "",
+           "orlith: error: none.cube: Iridas LUT reader: unable to open file.\n");
+    expect({"diff", "a.cube", "none"}, 1, "",
+           "orlith: error: none: No reader found for extension \"%s\". (\"\")\n");
+}
+
+}  // namespace
