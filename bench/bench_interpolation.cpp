@@ -42,8 +42,9 @@ ol::RGB plainTrilinear(const ol::LUT& lut, const ol::RGB& point) {
     int index[3][2];
     double weight[3][2];
     for (unsigned c = 0; c < 3; ++c) {
-        const double x = (static_cast<double>(point[c]) - lut.transform[3][c]) /
-                         static_cast<double>(lut.transform[c][c]);
+        const double x =
+            (static_cast<double>(point[c]) - static_cast<double>(lut.transform[3][c])) /
+            static_cast<double>(lut.transform[c][c]);
         index[c][0] = std::clamp(static_cast<int>(std::floor(x)), 0, sizes[c] - 1);
         index[c][1] = std::min(index[c][0] + 1, sizes[c] - 1);
         weight[c][1] = x - index[c][0];
