@@ -1,7 +1,5 @@
 #pragma once
 
-#include <cstddef>
-
 #include "lut/LUT.h"
 
 namespace Orlith::LUT {
@@ -32,14 +30,5 @@ RGB CubicInterpolate(const LUT& lut, const RGB& point);
 /// a straight line; beyond several, the lines of each axis are blended by how far outside it lies.
 /// @throws Exception "Extrapolate: expecting a 3D lut"
 RGB Extrapolate(const LUT& lut, int r, int g, int b);
-
-/// Looks t in [0, 1] up in one channel of a curve by linear interpolation; clamps outside.
-///
-/// @param entries     the curve; at least one
-/// @param entryCount  entries stored; no element beyond is read
-/// @param channel     0 to 2
-/// @param points      points of the curve on this channel, which may differ from entryCount
-float interpolateCurve(const RGB* entries, std::size_t entryCount, unsigned channel, float points,
-                       float t);
 
 }  // namespace Orlith::LUT

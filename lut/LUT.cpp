@@ -1,5 +1,6 @@
 #include "lut/LUT.h"
 
+#include "lut/CurveLookup.h"
 #include "lut/Exception.h"
 
 namespace Orlith::LUT {
@@ -56,6 +57,23 @@ const float* LUT::data() const {
 
 std::uint32_t LUT::dataSize() const {
     return static_cast<std::uint32_t>(values.size() * sizeof(RGB));
+}
+
+RGB LUT::applyShaper(const RGB& point) const {
+    RGB position = point;
+    if (!inputShaper.empty()) {
+        for (unsigned c = 0; c < 3; ++c) {
+            position[c] = locateInCurve(inputShaper.entries.data(), inputShaper.entries.size(), c,
+                                        inputShaper.counts[c], point[c]);
+        }
+    }
+    if (!outputShaper.empty()) {
+        for (unsigned c = 0; c < 3; ++c) {
+            position[c] = interpolateCurve(outputShaper.entries.data(), outputShaper.entries.size(),
+                                           c, outputShaper.counts[c], position[c]);
+        }
+    }
+    return position;
 }
 
 void LUT::minmax(RGB&, RGB&) const {

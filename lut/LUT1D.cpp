@@ -2,7 +2,7 @@
 
 #include <stdexcept>
 
-#include "lut/Interpolation.h"
+#include "lut/CurveLookup.h"
 
 namespace Orlith::LUT {
 

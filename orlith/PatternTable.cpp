@@ -49,7 +49,7 @@ void checkPattern(const std::string& path, const zefra::Iop& image) {
 
 boost::shared_ptr<Orlith::LUT::LUT3D> tableOfPattern(zefra::Iop& image) {
     const Patches patches(image.box());
-    const auto lut = boost::make_shared<Orlith::LUT::LUT3D>();
+    auto lut = boost::make_shared<Orlith::LUT::LUT3D>();
     lut->resize(patches.points);
     const int width = patches.columns * Layout::kPatchPixels;
     const std::int64_t pointCount = std::int64_t{patches.points} * patches.points * patches.points;

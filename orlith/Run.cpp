@@ -20,7 +20,7 @@ struct RunOptions {
 std::string readScript(const std::string& path) {
     if (std::filesystem::is_directory(path)) throw Failure(path + ": is a folder");
     std::ifstream file(path, std::ios::binary);
-    const std::string text{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+    std::string text{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
     if (!file || file.bad()) throw Failure(path + ": cannot be read");
     return text;
 }
