@@ -11,8 +11,6 @@
 
 #include "zefra/PatternLayout.h"
 
-extern char** environ;
-
 namespace test {
 namespace {
 
@@ -92,9 +90,10 @@ void writePattern(const std::string& path, int points, const Look& look) {
     const auto last = static_cast<float>(points - 1);
     writeImage(path, 7 * columns, 7 * zefra::PatternLayout::rows(points), [&](int x, int y) {
         const int index = y / 7 * columns + x / 7;
-        return look({static_cast<float>(index % points) / last,
-                     static_cast<float>(index / points % points) / last,
-                     static_cast<float>(index / points / points) / last});
+        const int green = index / points % points;
+        const int blue = index / (points * points);
+        return look({static_cast<float>(index % points) / last, static_cast<float>(green) / last,
+                     static_cast<float>(blue) / last});
     });
 }
 

@@ -75,8 +75,9 @@ TEST_F(UsageTest, ResultsThatCannotBeDeliveredAreAFailure) {
     folder_.write("a.cube", "LUT_1D_SIZE 2\n0 0 0\n1 1 1\n");
     const std::string program = ORLITH_TEST_PROGRAM;
     for (const std::string command : {" info a.cube", " --help"}) {
-        const std::string line =
-            "cd '" + folder_.path("") + "' && '" + program + "'" + command + " 2>err >/dev/full";
+        std::string line = "cd '";
+        line.append(folder_.path("")).append("' && '").append(program).append("'");
+        line.append(command).append(" 2>err >/dev/full");
         const int status = std::system(line.c_str());
         EXPECT_EQ(WEXITSTATUS(status), 1) << command;
         EXPECT_EQ(read("err"), "orlith: error: standard output cannot be written\n");
