@@ -4,21 +4,17 @@
 
 namespace {
 
-using test::Words;
-
-// A curve that is no number in one place and rises and falls in others.
-constexpr char kCurve[] = "LUT_1D_SIZE 3\n0 1 0\n0.1 0.25 nan\n1 0.5 inf\n";
 // Red and green swapped, blue bent: off the identity by at most 1.
 constexpr char kLattice[] =
     "LUT_3D_SIZE 2\n"
     "0 0 0.5\n0 1 0.5\n1 0 0.5\n1 1 0.5\n"
     "0 0 0.25\n0 1 0.25\n1 0 0.25\n1 1 0.25\n";
 
-class InspectTest : public test::ProgramTest {};
+using InspectTest = test::ProgramTest;
 
 TEST_F(InspectTest, InfoTellsAPersonWhatIsInAFile) {
     folder_.write("lattice.cube", kLattice);
-    EXPECT_EQ(output({"info", "lattice.cube"}),
+    EXPECT_EQ(output("info lattice.cube"),
               "file            lattice.cube\n"
               "format          .cube\n"
               "table           3D, 2 x 2 x 2 points\n"
@@ -27,8 +23,8 @@ TEST_F(InspectTest, InfoTellsAPersonWhatIsInAFile) {
               "range           0 0 0.25 to 1 1 0.5\n"
               "from identity   1 at most\n"
               "monotone        red yes, green yes, blue yes\n");
-    folder_.write("curve", kCurve);
-    EXPECT_EQ(output({"info", "curve", "--from", "cube", "--values"}),
+    folder_.write("curve", "LUT_1D_SIZE 3\n0 1 0\n0.1 0.25 nan\n1 0.5 inf\n");
+    EXPECT_EQ(output("info curve --from cube --values"),
               "file            curve\n"
               "format          .cube\n"
               "table           1D, 3 entries\n"
@@ -49,7 +45,7 @@ TEST_F(InspectTest, InfoPrintsOneJsonObject) {
                   "CSPLUTV100\n3D\n\n2\n0 1\n0 0.5\n3\n0 0.25 1\n0 1e-7 1\n2\n-inf 1\n0 nan\n\n"
                   "1 1 2\n0.1 0.2 0.3\n-nan inf 16777216\n");
     EXPECT_EQ(
-        output({"info", name, "--json", "--values"}),
+        output("info --json --values " + name),
         "{\"file\": \"a\\\"\\\\\\n\xc3\xa9\xef\xbf\xbd.csp\", \"format\": \".csp\", \"kind\": "
         "\"3D\", \"size\": [1, 1, 2],\n"
         " \"samples_read\": 2,\n"
@@ -62,130 +58,95 @@ TEST_F(InspectTest, InfoPrintsOneJsonObject) {
         " \"values\": [[0.1, 0.2, 0.3], [\"nan\", \"inf\", 16777216]]}\n");
 }
 
-TEST_F(InspectTest, InfoAnswersATinyFileWithAHugeClaimAtOnce) {
-    folder_.write("claim.cube", "LUT_3D_SIZE 1000\n0 0 0\n");
-    const std::string warning =
-        "orlith: warning: claim.cube: holds 1 samples, its table has 1000000000 points\n";
-    const test::Outcome json = run({"info", "claim.cube", "--json"});
-    EXPECT_EQ(json.status, 0);
-    EXPECT_EQ(json.err, warning);
-    EXPECT_NE(json.out.find("\"samples_read\": 1,\n"), std::string::npos);
-    EXPECT_NE(json.out.find("\"range\": null}\n"), std::string::npos);
-    expect({"info", "claim.cube", "--values"}, 1, "",
-           warning +
-               "orlith: error: claim.cube: 1000000000 points are too many for --values (at most"
-               " 16777216)\n");
-    expect({"eval", "claim.cube", "1", "1", "1"}, 0, "0 0 0\n", warning);
+TEST_F(InspectTest, TinyFilesWithHugeClaimsAreAnsweredAtOnce) {
+    folder_.write("claim.cube", "LUT_3D_SIZE 400\n0 0 0\n");
     folder_.write("surplus.cub", "# width 1 1 1\n0 0 0\n1 1 1\n");
-    expect({"eval", "surplus.cub", "0", "0", "0"}, 0, "1 1 1\n",
-           "orlith: warning: surplus.cub: holds 2 samples, its table has 1 points\n");
+#define WARNING "orlith: warning: claim.cube: holds 1 samples, its table has 64000000 points\n"
+    const test::Outcome json = run("info claim.cube --json");
+    EXPECT_EQ(json.status, 0);
+    EXPECT_EQ(json.err, WARNING);
+    test::expectIn(json.out, "\"samples_read\": 1,\n");
+    test::expectIn(json.out, "\"range\": null}\n");
+    expectAll({
+        {"info claim.cube --values", 1, "",
+         WARNING "orlith: error: claim.cube: 64000000 points are too many for --values (at most"
+                 " 16777216)\n"},
+        {"eval claim.cube 1 1 1", 0, "0 0 0\n", WARNING},
+        {"eval surplus.cub 0 0 0", 0, "1 1 1\n",
+         "orlith: warning: surplus.cub: holds 2 samples, its table has 1 points\n"},
+    });
 }
 
 TEST_F(InspectTest, InfoReadsA3dlFileAsItIsTold) {
-    const std::string codes =
-        "0 255 \n0 0 0\n0 0 300\n0 255 0\n0 0 0\n0 0 0\n0 0 0\n0 0 0\n255 0 0\n";
-    folder_.write("a.3dl", codes);
+    folder_.write("a.3dl",
+                  "0 255 \n0 0 0\n0 0 300\n0 255 0\n0 0 0\n0 0 0\n0 0 0\n0 0 0\n255 0 0\n");
     const struct {
-        Words options;
-        const char* range;
+        const char *options, *range;
     } kCases[] = {
-        {{}, "0 0 0 to 0.24926686 0.24926686 0.29325515"},  // 300 takes ten bits
-
-        {{"--read-output-bitdepth", "8", "--normalize-output"}, "0 0 0 to 0.85 0.85 1.0000001"},
-        {{"--read-output-bitdepth", "input", "--read-format-3dl", "scratch"},
+        {"", "0 0 0 to 0.24926686 0.24926686 0.29325515"},  // 300 takes ten bits
+        {" --read-output-bitdepth 8 --normalize-output", "0 0 0 to 0.85 0.85 1.0000001"},
+        {" --read-output-bitdepth input --read-format-3dl scratch",
          "-0.060036387 -0.060036387 -0.060036387 to 0.9605822 0.9605822 1.1406913"},
     };
-    for (const auto& each : kCases) {
-        Words arguments = {"info", "a.3dl"};
-        arguments.insert(arguments.end(), each.options.begin(), each.options.end());
-        EXPECT_NE(output(arguments).find(std::string("range           ") + each.range + "\n"),
-                  std::string::npos)
-            << output(arguments);
-    }
+    for (const auto& each : kCases)
+        test::expectIn(output(std::string("info a.3dl") + each.options),
+                       std::string("\nrange           ") + each.range + "\n");
 }
 
 TEST_F(InspectTest, EvalSendsColoursThroughATable) {
     folder_.write("a.cube", kLattice);
-    const struct {
-        Words arguments;
-        const char* out;
-    } kCases[] = {
-        {{"0.25", "0.5", "0.5"}, "0.5 0.25 0.375\n"},
-        {{"0.25", "0.75", "1", "--mode", "step"}, "0 0 0.25\n"},
-        {{"0.25", "0.5", "0.5", "--mode", "staggered"}, "0.5 0.25 0.25\n"},
-
-        {{"--extrapolate", "-0.5", "0", "0"}, "0 -0.5 0.5\n"},
-        {{"1e-60", "+1", "0x1"}, nullptr},
-        {{"1e-60", "+1", "1e60"}, "nan nan nan\n"},
-    };
-    for (const auto& each : kCases) {
-        Words arguments = {"eval", "a.cube"};
-        arguments.insert(arguments.end(), each.arguments.begin(), each.arguments.end());
-        if (each.out == nullptr) {
-            expect(arguments, 2, "", "orlith: error: \"0x1\" is not a number\n");
-        } else {
-            EXPECT_EQ(output(arguments), each.out) << ::testing::PrintToString(each.arguments);
-        }
-    }
-}
-
-TEST_F(InspectTest, EvalReadsColoursFromStandardInput) {
-    folder_.write("a.cube", kLattice);
-    EXPECT_EQ(output({"eval", "a.cube"}, ""), "");
-    EXPECT_EQ(output({"eval", "a.cube"}, "0 0 0\r\n\n \t1\t0.25 +1e0 \n-1 5 nan"),
+    expectAll({
+        {"eval a.cube 0.25 0.5 0.5", 0, "0.5 0.25 0.375\n", ""},
+        {"eval a.cube 0.25 0.75 1 --mode step", 0, "0 0 0.25\n", ""},
+        {"eval a.cube 0.25 0.5 0.5 --mode staggered", 0, "0.5 0.25 0.25\n", ""},
+        {"eval a.cube --extrapolate -0.5 0 0", 0, "0 -0.5 0.5\n", ""},
+        {"eval a.cube 1e-60 +1 1e60", 0, "nan nan nan\n", ""},
+        {"eval a.cube 1 1 0x1", 2, "", "orlith: error: \"0x1\" is not a number\n"},
+    });
+    EXPECT_EQ(output("eval a.cube", ""), "");
+    EXPECT_EQ(output("eval a.cube", "0 0 0\r\n\n \t1\t0.25 +1e0 \n-1 5 nan"),
               "0 0 0.5\n0.25 1 0.25\nnan nan nan\n");
     for (const std::string line : {"1 2", "1 2 3 4", "1 2 3x"}) {
-        const test::Outcome outcome = run({"eval", "a.cube"}, "0 0 0\n\n" + line + "\n1 1 1\n");
+        const test::Outcome outcome = run("eval a.cube", "0 0 0\n\n" + line + "\n1 1 1\n");
         EXPECT_EQ(outcome.status, 1) << line;
         EXPECT_EQ(outcome.out, "0 0 0.5\n");
         EXPECT_EQ(outcome.err, "orlith: error: standard input:3: expected three numbers\n");
     }
 }
 
+/// What diff prints.
+std::string table(const std::string& red, const std::string& green, const std::string& blue) {
+    return "               largest          mean           rms\nred     " + red + "\ngreen   " +
+           green + "\nblue    " + blue + "\n";
+}
+
 TEST_F(InspectTest, DiffComparesTables) {
     folder_.write("a.cube", kLattice);
     folder_.write("b.cube", test::replaced(kLattice, "0 0 0.25", "0.5 0 0.5"));
-    const std::string differences =
-        "               largest          mean           rms\n"
-        "red                0.5        0.0625      0.176777\n"
-        "green                0             0             0\n"
-        "blue              0.25       0.03125     0.0883883\n";
-    const std::string none =
-        "               largest          mean           rms\n"
-        "red                  0             0             0\n"
-        "green                0             0             0\n"
-        "blue                 0             0             0\n";
-    expect({"diff", "a.cube", "a.cube"}, 0, none, "");
-    expect({"diff", "a.cube", "b.cube"}, 1, differences, "");
-    expect({"diff", "a.cube", "b.cube", "--tolerance", "0.5"}, 0, differences, "");
-    expect({"diff", "a.cube", "b.cube", "--tolerance", "0.4999"}, 1, differences, "");
-
-    // Another size: at the points of the larger, 0 0.5 1, whichever comes first.
     folder_.write("curve2.cube", "LUT_1D_SIZE 2\n0 0 0\n1 1 1\n");
     folder_.write("curve3.cube", "LUT_1D_SIZE 3\n0 0 0\n0.5 0.5 0.75\n1 1 1\n");
-    const std::string bent =
-        "               largest          mean           rms\n"
-        "red                  0             0             0\n"
-        "green                0             0             0\n"
-        "blue              0.25     0.0833333      0.144338\n";
-    expect({"diff", "curve2.cube", "curve3.cube"}, 1, bent, "");
-    expect({"diff", "curve3.cube", "curve2.cube"}, 1, bent, "");
-    // A curve against a lattice: red and green swapped, blue between 0.5 and 0.25.
-    EXPECT_EQ(run({"diff", "a.cube", "curve2.cube", "--tolerance", "1"}).status, 0);
-    EXPECT_EQ(run({"diff", "a.cube", "curve2.cube", "--tolerance", "0.9"}).status, 1);
-
-    // No number equals no number, but nothing else.
     folder_.write("nan.cube", "LUT_1D_SIZE 2\n0 0 0\n1 nan 1\n");
-    expect({"diff", "nan.cube", "nan.cube"}, 0, none, "");
-    const test::Outcome outcome = run({"diff", "nan.cube", "curve2.cube", "--tolerance", "9e99"});
-    EXPECT_EQ(outcome.status, 1);
-    EXPECT_NE(outcome.out.find("green              inf           inf           inf\n"),
-              std::string::npos)
-        << outcome.out;
-    expect({"diff", "a.cube", "none.cube"}, 1, "",
-           "orlith: error: none.cube: Iridas LUT reader: unable to open file.\n");
-    expect({"diff", "a.cube", "none"}, 1, "",
-           "orlith: error: none: No reader found for extension \"%s\". (\"\")\n");
+    const std::string none = "             0             0             0";
+    const std::string all = table(none, none, none);
+    const std::string some = table("           0.5        0.0625      0.176777", none,
+                                   "          0.25       0.03125     0.0883883");
+    const std::string bent = table(none, none, "          0.25     0.0833333      0.144338");
+    const std::string wild = table(none, "           inf           inf           inf", none);
+    expectAll({
+        {"diff nan.cube nan.cube", 0, all.c_str(), ""},  // NaN equals NaN, but nothing else
+        {"diff nan.cube curve2.cube --tolerance 9e99", 1, wild.c_str(), ""},
+        {"diff a.cube b.cube", 1, some.c_str(), ""},
+        {"diff a.cube b.cube --tolerance 0.5", 0, some.c_str(), ""},
+        {"diff a.cube b.cube --tolerance 0.4999", 1, some.c_str(), ""},
+        // Of other size: at the points of the larger, whichever comes first.
+        {"diff curve2.cube curve3.cube", 1, bent.c_str(), ""},
+        {"diff curve3.cube curve2.cube", 1, bent.c_str(), ""},
+        {"diff a.cube none", 1, "",
+         "orlith: error: none: No reader found for extension \"%s\". (\"\")\n"},
+    });
+    // A curve against a lattice with red and green swapped.
+    EXPECT_EQ(run("diff a.cube curve2.cube --tolerance 1").status, 0);
+    EXPECT_EQ(run("diff a.cube curve2.cube --tolerance 0.9").status, 1);
 }
 
 }  // namespace

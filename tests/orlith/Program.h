@@ -3,15 +3,14 @@
 #include <gtest/gtest.h>
 #include <sys/types.h>
 
+#include <filesystem>
 #include <functional>
+#include <initializer_list>
 #include <string>
-#include <vector>
 
 #include "tests/support/Files.h"
 
 namespace test {
-
-using Words = std::vector<std::string>;
 
 /// What a run of the program left behind.
 struct Outcome {
@@ -23,11 +22,8 @@ struct Outcome {
 /// The program, running in a folder. One that hangs is ended after a minute.
 class Program {
 public:
-    /// @param environment  "NAME=value" on top of the test's own
-    Program(const std::string& folder, const Words& arguments, const std::string& input = "",
-            const Words& environment = {});
-    Program(const Program&) = delete;
-    Program& operator=(const Program&) = delete;
+    /// @param command  arguments, a blank between any two; '' is an empty one
+    Program(const std::string& folder, const std::string& command, const std::string& input = "");
 
     void interrupt() const;  ///< Ctrl-C
     Outcome wait();
@@ -46,34 +42,45 @@ struct Pixel {
 void writeImage(const std::string& path, int width, int height,
                 const std::function<Pixel(int x, int y)>& pixel);
 
-/// What a look does to the colour of a patch.
-using Look = std::function<Pixel(const Pixel&)>;
-
 /// A look that tells the channels apart: (r / 2 + 0.25, g * g, 1 - b).
 Pixel markedLook(const Pixel& colour);
 
-/// Writes a processed pattern of that many points; the file's name says in which format.
-void writePattern(const std::string& path, int points, const Look& look = markedLook);
+/// Writes the pattern of that many points, processed by a look.
+void writePattern(const std::string& path, int points,
+                  const std::function<Pixel(const Pixel&)>& look = markedLook);
+
+/// A command, as for Program, and its exact outcome.
+struct Case {
+    const char* command;
+    int status;
+    const char *out, *err;
+};
 
 /// Runs of the program in a folder of their own.
 class ProgramTest : public ::testing::Test {
 protected:
-    Outcome run(const Words& arguments, const std::string& input = "",
-                const Words& environment = {}) const {
-        return Program(folder_.path(""), arguments, input, environment).wait();
+    Outcome run(const std::string& command, const std::string& input = "") const {
+        return Program(folder_.path(""), command, input).wait();
+    }
+    void expect(const std::string& command, int status, const std::string& out,
+                const std::string& err) const;
+    void expectAll(std::initializer_list<Case> cases) const {
+        for (const Case& each : cases)
+            expect(each.command, each.status, each.out, each.err);
     }
 
-    /// Expects the run to succeed without a word on standard error; returns its output.
-    std::string output(const Words& arguments, const std::string& input = "") const;
+    /// Expects a run to succeed without a word on standard error; returns its output.
+    std::string output(const std::string& command, const std::string& input = "") const;
 
-    /// Expects exactly that outcome.
-    void expect(const Words& arguments, int status, const std::string& out,
-                const std::string& err) const;
-
-    bool exists(const std::string& name) const;
+    bool exists(const std::string& name) const {
+        return std::filesystem::exists(folder_.path(name));
+    }
     std::string read(const std::string& name) const { return readFile(folder_.path(name)); }
 
     TempFolder folder_;
 };
+
+/// Expects a text to be somewhere in another.
+void expectIn(const std::string& text, const std::string& part);
 
 }  // namespace test
