@@ -8,7 +8,7 @@ namespace Orlith::LUT {
 ///
 /// Storage  sample i holds red, green and blue of place i.
 /// Values   single precision, nominally 0 to 1, never clamped or rounded here.
-class LUT1D final : public LUT {
+class LUT1D : public LUT {
 public:
     LUT1D() = default;
 

@@ -10,7 +10,7 @@ namespace Orlith::LUT {
 /// Values   single precision, nominally 0 to 1, never clamped or rounded here.
 /// Domain   index i on channel c stands for the input i * scale_c + offset_c (see transform).
 /// Threads  const members may run at once; the others may overlap nothing.
-class LUT3D final : public LUT {
+class LUT3D : public LUT {
 public:
     LUT3D() = default;
 
@@ -19,6 +19,7 @@ public:
     int width() const override { return width_; }
     int height() const override { return height_; }
     int depth() const override { return depth_; }
+    /// Calls the other one, so that a derived class which overrides that sees every change.
     void resize(int n) override;
     void resize(int width, int height, int depth) override;
     RGB& get(int r, int g, int b) override;

@@ -99,6 +99,22 @@ TEST(LUT, StoresRedFastestAsPlainFloats) {
     EXPECT_EQ(cube.dataSize(), 431244U);
 }
 
+TEST(LUT, ShowsADerivedLatticeEveryResize) {
+    class Counting final : public ol::LUT3D {
+    public:
+        using LUT3D::resize;
+        void resize(int width, int height, int depth) override {
+            ++resizes;
+            LUT3D::resize(width, height, depth);
+        }
+        int resizes = 0;
+    };
+    Counting lut;
+    lut.resize(3);
+    EXPECT_EQ(lut.resizes, 1);
+    EXPECT_EQ(lut.depth(), 3);
+}
+
 TEST(LUT, KeepsSamplesInStorageAndAddsZeros) {
     const auto lut = markedLattice(4, 4, 4);
     const float* const before = lut->data();
