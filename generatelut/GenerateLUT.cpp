@@ -117,9 +117,12 @@ void GenerateLUT::declare3DLControls(zefra::ControlPass& pass) {
 }
 
 bool GenerateLUT::knob_changed(const zefra::Control& control) {
-    if (control.name() == "file_type" && fileTypeControl_ != nullptr) {
-        typeControlCount_ =
-            node().replaceControls(*fileTypeControl_, typeControlCount_, declareTypeControls);
+    if (control.name() == "file_type") {
+        // Without a panel there are no controls to exchange.
+        if (fileTypeControl_ != nullptr) {
+            typeControlCount_ =
+                node().replaceControls(*fileTypeControl_, typeControlCount_, declareTypeControls);
+        }
         return true;
     }
     if (control.name() == "file") {

@@ -37,9 +37,10 @@ void set(Orlith::LUT::LUTFileWriter& writer, const char* name, const Value& valu
 
 void setWriterOptions(Orlith::LUT::LUTFileWriter& writer, const Options3DL& options) {
     const int inputBits = bitsOf(options.bitDepth);
-    // The output menu begins with "input bit depth".
+    // The output menu begins with "input bit depth". Limited before it is counted down: the
+    // smallest integer has none below it.
     const int outputBits =
-        options.outputBitDepth == 0 ? inputBits : bitsOf(options.outputBitDepth - 1);
+        options.outputBitDepth == 0 ? inputBits : bitsOf(std::max(options.outputBitDepth, 1) - 1);
     set<property::Int>(writer, "inputBitDepth", inputBits);
     set<property::Int>(writer, "outputBitDepth", outputBits);
     set<property::Int>(writer, "clampOutput", options.clampOutput ? 1 : 0);

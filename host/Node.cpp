@@ -106,7 +106,7 @@ void Node::setValue(const std::string& name, const std::string& text) {
     PanelControl& changed = control(name);
     if (changed.kind() == Kind::Obsolete) return runObsoleteScript(changed, text);
     try {
-        changed.parse(text);
+        changed.parse(text, scriptDepth_ > 0);
     } catch (const Error& failure) {
         throw Error(fmt::format("{}.{}: {}", name_, name, failure.what()));
     }

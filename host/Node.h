@@ -44,7 +44,7 @@ public:
 
     /// Sets a control as a person at the panel does: the text is understood by the control's kind,
     /// stored in the operator, and the operator is told of the change. A value for an obsolete name
-    /// runs that name's script.
+    /// runs that name's script, which may set a menu to an index beyond its entries.
     /// @throws Error  no such control, or a text that does not fit it
     void setValue(const std::string& name, const std::string& text);
 

@@ -39,9 +39,9 @@ bool parseBoolean(std::string_view text, int& number) {
     return isTrue || isFalse;
 }
 
-/// An entry's text, or an index. An operator's own script may set an index that lies beyond the
-/// entries, so that only negative ones are wrong.
-bool parseMenu(std::string_view text, const std::vector<std::string>& items, int& number) {
+/// An entry's text, or an index.
+bool parseMenu(std::string_view text, const std::vector<std::string>& items, bool mayLeaveMenu,
+               int& number) {
     const auto item = std::find_if(items.begin(), items.end(), [&](const std::string& each) {
         return trimmed(each) == trimmed(text);
     });
@@ -51,8 +51,19 @@ bool parseMenu(std::string_view text, const std::vector<std::string>& items, int
     }
     int index = 0;
     if (!parseInteger(text, index) || index < 0) return false;
+    if (!mayLeaveMenu && static_cast<std::size_t>(index) >= items.size()) return false;
     number = index;
     return true;
+}
+
+/// The entries of a menu in a row.
+std::string entryList(const std::vector<std::string>& items) {
+    std::string list;
+    for (const std::string& item : items) {
+        if (!list.empty()) list += ", ";
+        list += trimmed(item).empty() ? "(blank)" : item;
+    }
+    return list;
 }
 
 }  // namespace
@@ -80,14 +91,14 @@ std::string PanelControl::valueText() const {
     }
 }
 
-void PanelControl::parse(const std::string& text) {
+void PanelControl::parse(const std::string& text, bool mayLeaveMenu) {
     switch (kind_) {
         case Kind::FileName:
             text_ = text;
             return;
         case Kind::Enumeration:
-            if (parseMenu(text, items_, number_)) return;
-            throw Error(fmt::format("\"{}\" is not on the menu", text));
+            if (parseMenu(text, items_, mayLeaveMenu, number_)) return;
+            throw Error(fmt::format("\"{}\" is not on the menu: {}", text, entryList(items_)));
         case Kind::Integer:
             if (parseInteger(text, number_)) return;
             throw Error(fmt::format("\"{}\" is not an integer", text));

@@ -37,9 +37,11 @@ public:
     /// The value as a person reads it: a menu's entry, or its index where there is none.
     std::string valueText() const;
 
-    /// Takes a value over from what a person types.
+    /// Takes a value over from text.
+    /// @param mayLeaveMenu  an operator's own script may set an index beyond a menu's entries,
+    ///                      a person may not
     /// @throws Error  and keeps the value, if the text does not fit the kind
-    void parse(const std::string& text);
+    void parse(const std::string& text, bool mayLeaveMenu);
 
     /// Sets a number and stores the panel's values in the operator. Nothing for file names and for
     /// kinds without a value.

@@ -4,6 +4,7 @@
 
 #include <array>
 #include <filesystem>
+#include <memory>
 #include <string>
 #include <vector>
 
@@ -252,6 +253,9 @@ TEST_F(GenerateLUTTest, FollowsTheFileName) {
         EXPECT_TRUE(node_->op().knob_changed(*node_->findControl(name))) << name;
     for (const char* const name : {"lut1d", "style1d", "generate"})
         EXPECT_FALSE(node_->op().knob_changed(*node_->findControl(name))) << name;
+    const std::unique_ptr<zefra::Op> unshown(
+        zefra::Description::find("GenerateLUT")->makeOp(*node_));
+    EXPECT_TRUE(unshown->knob_changed(*node_->findControl("file_type"))) << "without a panel";
 }
 
 // What it does with the image.
@@ -365,12 +369,11 @@ TEST_F(GenerateLUTTest, SaysWhatFailed) {
         {"out", "", "", "", kNoType, 0},
         {"out.icc", "", "", "", kNoType, 0},
         {"out.CUBE", "", "", "", kNoType, 0},
-        {"out.cube", "8", "", "", kNoType, 0},  // beyond the menu
         {"out.cms", ".cms", "lut1d", "0",
          "Error writing LUT file: unable to write: expecting pre-LUT data", 3},
         {"none/out.cube", ".cube", "", "",
          "Error writing LUT file: unable to open file for writing", 3},
-        {"out.3dl", ".3dl", "format_3dl_id", "3",
+        {"out.3dl", ".3dl", "scratch_compatible", "true",
          "Error writing LUT file: 3DL file reader: invalid 3DL format specified for writing", 3},
     };
     for (const auto& each : kCases) {
@@ -382,6 +385,9 @@ TEST_F(GenerateLUTTest, SaysWhatFailed) {
         EXPECT_EQ(PlacesOp::rows, each.rows);
     }
     EXPECT_FALSE(exists("out") || exists("out.icc") || exists("out.cube"));
+    node_->setValue("file", folder_.path("out"));
+    node_->findControl("file_type")->setValue(8);
+    EXPECT_EQ(execute({}), Texts{kNoType}) << "beyond the menu";
 }
 
 TEST_F(GenerateLUTTest, DoesNothingWithoutAFileName) {

@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 
+#include <limits>
 #include <string>
 
 namespace {
@@ -54,6 +55,7 @@ TEST(WriterOptions, AreThoseOfTheMenus) {
         {99, 0, true, 0, 16, 16, "flame", -999.0, -999.0},
         {-5, 99, true, 0, 4, 16, "flame", -999.0, -999.0},
         {2, -1, true, 0, 10, 4, "flame", -999.0, -999.0},
+        {2, std::numeric_limits<int>::min(), true, 0, 10, 4, "flame", -999.0, -999.0},
     };
     for (const auto& each : kCases) {
         SCOPED_TRACE(std::to_string(each.bitDepth) + " " + std::to_string(each.outputBitDepth) +

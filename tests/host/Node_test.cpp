@@ -63,21 +63,13 @@ TEST_F(NodeTest, UnderstandsTextByTheKindOfControl) {
     const struct {
         const char *control, *text, *shown;
     } kCases[] = {
-        {"file_type", ".3dl", ".3dl"},
-        {"file_type", "   ", "   "},
-        {"file_type", ".vf ", ".vf"},
-        {"file_type", "", "   "},
-        {"file_type", "1", ".3dl"},
-        {"format_3dl_id", "3", "3"},
-        {"format_3dl_id", "2", "assimulate scratch"},
-        {"clamp_output", "no", "false"},
-        {"clamp_output", "True", "true"},
-        {"clamp_output", "off", "false"},
-        {"clamp_output", "1", "true"},
-        {"file_type", "6", ".cube"},
-        {"lut1d", "-2147483648", "-2147483648"},
-        {"lut1d", " +12 ", "12"},
-        {"file", " two words.cube", " two words.cube"},
+        {"file_type", ".3dl", ".3dl"},    {"file_type", "   ", "   "},
+        {"file_type", ".vf ", ".vf"},     {"file_type", "", "   "},
+        {"file_type", "1", ".3dl"},       {"format_3dl_id", "2", "assimulate scratch"},
+        {"clamp_output", "no", "false"},  {"clamp_output", "True", "true"},
+        {"clamp_output", "off", "false"}, {"clamp_output", "1", "true"},
+        {"file_type", "6", ".cube"},      {"lut1d", "-2147483648", "-2147483648"},
+        {"lut1d", " +12 ", "12"},         {"file", " two words.cube", " two words.cube"},
     };
     host::Node& node = host_.createNode("GenerateLUT");
     for (const auto& each : kCases) {
@@ -87,15 +79,20 @@ TEST_F(NodeTest, UnderstandsTextByTheKindOfControl) {
     }
 }
 
+#define FORMATS ": autodesk flame/smoke, autodesk lustre, assimulate scratch"
+
 TEST_F(NodeTest, RefusesTextThatDoesNotFit) {
     const struct {
         const char *control, *text, *failure;
     } kCases[] = {
         {"foo", "1", "GenerateLUT1: no control named \"foo\""},
         {"", "1", "GenerateLUT1: no control named \"\""},
-        {"format_3dl_id", "-1", "GenerateLUT1.format_3dl_id: \"-1\" is not on the menu"},
-        {"format_3dl_id", "", "GenerateLUT1.format_3dl_id: \"\" is not on the menu"},
-        {"file_type", ".xyz", "GenerateLUT1.file_type: \".xyz\" is not on the menu"},
+        {"format_3dl_id", "-1", "GenerateLUT1.format_3dl_id: \"-1\" is not on the menu" FORMATS},
+        {"format_3dl_id", "", "GenerateLUT1.format_3dl_id: \"\" is not on the menu" FORMATS},
+        {"format_3dl_id", "3", "GenerateLUT1.format_3dl_id: \"3\" is not on the menu" FORMATS},
+        {"file_type", ".xyz",
+         "GenerateLUT1.file_type: \".xyz\" is not on the menu: (blank), .3dl, .blut, .cms, .csp, "
+         ".cub, .cube, .vf"},
         {"clamp_output", "maybe", "GenerateLUT1.clamp_output: \"maybe\" is neither true nor false"},
         {"generate", "1", "GenerateLUT1.generate: the control has no value"},
     };

@@ -34,7 +34,7 @@ TEST_F(GenerateTest, RecordsALookInEveryFormat) {
         {"o.3dl --format-3dl scratch --bitdepth 16", "7.3e-06",
          "Warning: SCRATCH prefers 3DL files of 32x32x32\n", "0.3749977 0.25000367 0.25000367",
          nullptr},
-        {"o.3dl --knob bitdepth_id=99", "7.6e-06", SIZE_WARNING, "0.37500572 0.2500038 0.2500038",
+        {"o.3dl --knob bitdepth_id=4", "7.6e-06", SIZE_WARNING, "0.37500572 0.2500038 0.2500038",
          nullptr},
     };
     for (const auto& each : kCases) {
@@ -78,7 +78,9 @@ TEST_F(GenerateTest, FollowsNamesTypesAndControls) {
           "a=b.csp: .csp, 5 x 5 x 5 points, largest deviation 0\n", ""},
          "a=b.csp"},
         {{"o.cube --file-type png", 2, "",
-          "orlith: error: GenerateLUT1.file_type: \".png\" is not on the menu\n"},
+          "orlith: error: GenerateLUT1.file_type: \".png\" is not on the menu: (blank), .3dl, "
+          ".blut,"
+          " .cms, .csp, .cub, .cube, .vf\n"},
          nullptr},
         {{"o.3dl --lut1d 5", 2, "", "orlith: error: lut1d is not a control of .3dl files\n"},
          nullptr},
@@ -86,7 +88,12 @@ TEST_F(GenerateTest, FollowsNamesTypesAndControls) {
           "orlith: error: GenerateLUT1: no control named \"colour\"\n"},
          nullptr},
         {{"o.cube --knob file=", 2, "", "orlith: error: the output file has no name\n"}, nullptr},
-        {{"o.3dl --knob format_3dl_id=3", 1, "",
+        {{"o.3dl --knob bitdepth_id=10", 2, "",
+          "orlith: error: GenerateLUT1.bitdepth_id: \"10\" is not on the menu: 4 bit, 8 bit, 10 "
+          "bit,"
+          " 12 bit, 16 bit\n"},
+         nullptr},
+        {{"o.3dl --knob scratch_compatible=true", 1, "",
           "orlith: error: Error writing LUT file: 3DL file reader: invalid 3DL format specified"
           " for writing\n"},
          nullptr},

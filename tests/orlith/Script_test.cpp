@@ -66,7 +66,7 @@ TEST_F(ScriptTest, RunSaysWhatIsWrong) {
 }
 
 TEST_F(ScriptTest, PanelShowsTheControls) {
-    EXPECT_EQ(output("panel --knob file=x.3dl --knob format_3dl_id=3 --knob bitdepth_id=3"),
+    EXPECT_EQ(output("panel --knob file=x.3dl --knob scratch_compatible=true --knob bitdepth_id=3"),
               "GenerateLUT1\n"
               "  output file               file                x.3dl\n"
               "  file type                 file_type               | [.3dl] | .blut | .cms | .csp"
