@@ -200,6 +200,9 @@ void GenerateLUT::execute() {
         // Deliberate: the name as it was typed. An extension that was added above chose the writer
         // and is not part of the file's name.
         writer->write(file_, lut);
+        if (!writer->wroteAll()) {
+            error("%s", "Error writing LUT file: not all of the file could be written");
+        }
     } catch (const Orlith::LUT::Exception& exception) {
         error("Error writing LUT file: %s", exception.message());
     }

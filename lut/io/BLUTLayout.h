@@ -4,7 +4,7 @@
 #include <cstdint>
 #include <cstdio>
 
-#include <stdio.h>  // getc_unlocked, putc_unlocked: POSIX functions
+#include <stdio.h>  // getc_unlocked, a POSIX function
 
 namespace Orlith::LUT {
 
@@ -45,12 +45,6 @@ bool readBigEndian(std::FILE* file, std::uint32_t& bits) {
     }
     bits = read;
     return true;
-}
-
-/// Writes one number of four bytes; a failure is not noticed.
-inline void writeBigEndian(std::FILE* file, std::uint32_t bits) {
-    for (int shift = 24; shift >= 0; shift -= 8)
-        putc_unlocked(static_cast<int>(bits >> shift & 0xFF), file);
 }
 
 }  // namespace Orlith::LUT

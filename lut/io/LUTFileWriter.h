@@ -18,7 +18,7 @@ public:
     virtual ~LUTFileWriter() = default;
 
     /// Writes the table, replacing a file of that name. What goes wrong after the file was opened
-    /// (a full disk) is not noticed: read the file back to be sure.
+    /// (a full disk) is no exception: see wroteAll.
     /// @throws Exception  the format cannot hold this table, or the file cannot be opened
     virtual void write(const std::string& filename, const boost::shared_ptr<LUT>& lut) = 0;
 
@@ -29,6 +29,10 @@ public:
     bool setProperty(const std::string& name, const boost::shared_ptr<Property::Base>& property) {
         return properties_.insert(name, property);
     }
+
+    /// After write: whether the system took every byte, the closing of the file included. False
+    /// before the first write.
+    bool wroteAll() const { return wroteAll_; }
 
 protected:
     const Property::PropertySet& properties() const { return properties_; }
@@ -42,6 +46,9 @@ protected:
 
 private:
     Property::PropertySet properties_;
+
+protected:
+    bool wroteAll_ = false;
 };
 
 }  // namespace Orlith::LUT

@@ -187,7 +187,7 @@ void LUTFileWriter3DL::write(const std::string& filename, const boost::shared_pt
     expectCube(*lut);
     const Settings settings = findSettings(properties());
     checkDialect(settings, lut->width());
-    LineWriter file(filename, flushesLines());
+    LineWriter file(filename, flushesLines(), wroteAll_);
     writeHeader(file, settings, lut->width());
     writeGrid(file, settings, lut->width());
     writeLattice(file, settings, *lut);

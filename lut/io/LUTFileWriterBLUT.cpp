@@ -2,42 +2,51 @@
 
 #include "lut/io/LUTFileWriterBLUT.h"
 
+#include <algorithm>
+#include <boost/endian/conversion.hpp>
 #include <cstring>
-#include <memory>
+#include <iterator>
+#include <vector>
 
 #include "lut/Exception.h"
 #include "lut/io/BLUTLayout.h"
 #include "lut/io/Lattice.h"
+#include "lut/io/OutputFile.h"
 
 namespace Orlith::LUT {
 namespace {
 
-void writeFloat(std::FILE* file, float value) {
-    std::uint32_t bits;
-    std::memcpy(&bits, &value, sizeof(bits));
-    writeBigEndian(file, bits);
+void writeWord(OutputFile& file, std::uint32_t word) {
+    boost::endian::native_to_big_inplace(word);
+    char bytes[sizeof(word)];
+    std::memcpy(bytes, &word, sizeof(word));
+    file.write(bytes, sizeof(bytes));
 }
 
-void writeHeader(std::FILE* file, int width) {
-    std::fwrite(kBLUTMagic, 1, sizeof(kBLUTMagic), file);
-    for (const std::uint32_t word : {2U, 5U, 64U})
-        writeBigEndian(file, word);
-    for (int channel = 0; channel < 3; ++channel) {
-        writeFloat(file, 0.0F);
-        writeFloat(file, 1.0F);
+void writeFloats(OutputFile& file, const float* values, std::size_t count) {
+    constexpr std::size_t kBlockFloats = 16384;
+    std::vector<std::uint32_t> words;
+    for (std::size_t start = 0; start < count; start += kBlockFloats) {
+        words.resize(std::min(kBlockFloats, count - start));
+        const std::size_t byteCount = words.size() * sizeof(float);
+        std::memcpy(words.data(), values + start, byteCount);
+        for (std::uint32_t& word : words)
+            boost::endian::native_to_big_inplace(word);
+        file.write(reinterpret_cast<const char*>(words.data()), byteCount);
     }
+}
+
+void writeHeader(OutputFile& file, int width) {
+    file.write(kBLUTMagic, sizeof(kBLUTMagic));
+    for (const std::uint32_t word : {2U, 5U, 64U})
+        writeWord(file, word);
+    constexpr float kRanges[] = {0.0F, 1.0F, 0.0F, 1.0F, 0.0F, 1.0F};
+    writeFloats(file, kRanges, std::size(kRanges));
     // Deliberate: the width modulo 256, unchecked; a table too large for the format is written and
     // does not read back. Held by BLUTWriter.WritesTheWidthModulo256.
-    writeBigEndian(file, static_cast<std::uint32_t>(width) & 0xFF);
-    std::fputc(kBLUTFloats, file);
-}
-
-void writeSamples(std::FILE* file, const LUT& lut, const LatticeSize& size) {
-    const float* const samples = lut.data();
-    forEachRedFastest(size, [&](std::size_t element) {
-        for (std::size_t c = 0; c < 3; ++c)
-            writeFloat(file, samples[3 * element + c]);
-    });
+    writeWord(file, static_cast<std::uint32_t>(width) & 0xFF);
+    const char type = kBLUTFloats;
+    file.write(&type, 1);
 }
 
 }  // namespace
@@ -48,11 +57,9 @@ void LUTFileWriterBLUT::write(const std::string& filename, const boost::shared_p
     if (!lut->is1D() && !size.isCube()) {
         throw Exception("unable to write: must have the same dimension in r, g and b");
     }
-    const std::unique_ptr<std::FILE, int (*)(std::FILE*)> file(std::fopen(filename.c_str(), "wb"),
-                                                               std::fclose);
-    if (!file) throw Exception("unable to open file for writing");
-    writeHeader(file.get(), size.width);
-    writeSamples(file.get(), *lut, size);
+    OutputFile file(filename, wroteAll_);
+    writeHeader(file, size.width);
+    writeFloats(file, lut->data(), 3 * size.pointCount());  // storage has the file's order
 }
 
 }  // namespace Orlith::LUT

@@ -41,7 +41,7 @@ void writeLattice(LineWriter& file, const LUT& lut) {
 
 void LUTFileWriterCMS::write(const std::string& filename, const boost::shared_ptr<LUT>& lut) {
     expectWritable(*lut);
-    LineWriter file(filename, flushesLines());
+    LineWriter file(filename, flushesLines(), wroteAll_);
     writeHeader(file, *lut);
     writePreLUT(file, lut->outputShaper);
     file.endLine();

@@ -79,7 +79,7 @@ void writeLattice(LineWriter& file, const LUT& lut) {
 
 void LUTFileWriterCSP::write(const std::string& filename, const boost::shared_ptr<LUT>& lut) {
     if (hasShapers(*lut)) expectWritableShapers(*lut);
-    LineWriter file(filename, flushesLines());
+    LineWriter file(filename, flushesLines(), wroteAll_);
     writeHeader(file, *lut);
     if (hasShapers(*lut)) {
         writeShapers(file, *lut);

@@ -39,7 +39,7 @@ void writeCube(LineWriter& file, const LUT& lut, const LatticeSize& size) {
 void LUTFileWriterTruelight::write(const std::string& filename, const boost::shared_ptr<LUT>& lut) {
     if (lut->is1D()) throw Exception("unable to write: must be a 3D lut");
     const LatticeSize size = LatticeSize::of(*lut);
-    LineWriter file(filename, flushesLines());
+    LineWriter file(filename, flushesLines(), wroteAll_);
     writeHeader(file, size);
     writeInputLUT(file, lut->outputShaper);
     writeCube(file, *lut, size);

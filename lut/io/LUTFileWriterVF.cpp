@@ -49,7 +49,7 @@ void LUTFileWriterVF::write(const std::string& filename, const boost::shared_ptr
     if (!LatticeSize::of(*lut).isCube()) {
         throw Exception("unable to write: must have the same dimension in r, g and b");
     }
-    LineWriter file(filename, flushesLines());
+    LineWriter file(filename, flushesLines(), wroteAll_);
     writeHeader(file);
     writeParameters(file, lut->width());
     writeSamples(file, *lut);

@@ -385,6 +385,8 @@ TEST_F(GenerateLUTTest, SaysWhatFailed) {
         EXPECT_EQ(PlacesOp::rows, each.rows);
     }
     EXPECT_FALSE(exists("out") || exists("out.icc") || exists("out.cube"));
+    EXPECT_EQ(execute({"file", "/dev/full", "file_type", ".csp"}),
+              Texts{"Error writing LUT file: not all of the file could be written"});
     node_->setValue("file", folder_.path("out"));
     node_->findControl("file_type")->setValue(8);
     EXPECT_EQ(execute({}), Texts{kNoType}) << "beyond the menu";

@@ -1,13 +1,9 @@
 #include "lut/io/text/LineWriter.h"
 
-#include <unistd.h>
-
-#include <cerrno>
 #include <charconv>
 #include <cstdint>
 #include <cstring>
 
-#include "lut/Exception.h"
 #include "lut/io/text/DigitPairs.h"
 #include "lut/io/text/FixedNotation.h"
 
@@ -43,10 +39,8 @@ char* writeTriple(char* out, const Number* rgb, Write write) {
 
 }  // namespace
 
-LineWriter::LineWriter(const std::string& filename, bool flushLines)
-    : file_(std::fopen(filename.c_str(), "w")), handOverAt_(flushLines ? 0 : kBlockBytes) {
-    if (!file_) throw Exception("unable to open file for writing");
-}
+LineWriter::LineWriter(const std::string& filename, bool flushLines, bool& wroteAll)
+    : file_(filename, wroteAll), handOverAt_(flushLines ? 0 : kBlockBytes) {}
 
 LineWriter::~LineWriter() {
     handOver();
@@ -93,17 +87,7 @@ char* LineWriter::reserve(std::size_t length) {
 }
 
 void LineWriter::handOver() {
-    // Past the file's own buffer: lines are gathered here already, and one call a line is all the
-    // time there is when every line is handed over.
-    const int descriptor = fileno(file_.get());
-    const char* at = gathered_.data();
-    while (length_ > 0) {
-        const ssize_t byteCount = ::write(descriptor, at, length_);
-        if (byteCount < 0 && errno == EINTR) continue;
-        if (byteCount <= 0) break;  // a full disk: the rest is lost
-        at += byteCount;
-        length_ -= static_cast<std::size_t>(byteCount);
-    }
+    file_.write(gathered_.data(), length_);
     length_ = 0;
 }
 

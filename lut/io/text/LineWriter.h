@@ -1,9 +1,9 @@
 #pragma once
 
-#include <cstdio>
-#include <memory>
 #include <string>
 #include <string_view>
+
+#include "lut/io/OutputFile.h"
 
 namespace Orlith::LUT {
 
@@ -14,8 +14,10 @@ public:
     /// Creates the file, or empties it.
     /// @param flushLines  true: every line goes to the system when it is complete;
     ///                    false: lines are gathered into large blocks
+    /// @param wroteAll    set, when the file is closed, to whether the system took every byte;
+    ///                    outlives this object
     /// @throws Exception "unable to open file for writing"
-    LineWriter(const std::string& filename, bool flushLines);
+    LineWriter(const std::string& filename, bool flushLines, bool& wroteAll);
     LineWriter(const LineWriter&) = delete;
     LineWriter& operator=(const LineWriter&) = delete;
     ~LineWriter();
@@ -31,15 +33,11 @@ public:
     void endLine();
 
 private:
-    struct Close {
-        void operator()(std::FILE* file) const noexcept { std::fclose(file); }
-    };
-
     /// Room for that many characters more; pointer to the first.
     char* reserve(std::size_t length);
     void handOver();
 
-    std::unique_ptr<std::FILE, Close> file_;
+    OutputFile file_;
     std::size_t handOverAt_;  // gathered bytes that are worth a call
     std::string gathered_;    // fixed size; the first length_ characters count
     std::size_t length_ = 0;

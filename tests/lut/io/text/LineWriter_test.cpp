@@ -15,8 +15,9 @@ TEST(LineWriter, PutsALineTogether) {
     const TempFolder folder;
     const std::string path = folder.path("out");
     const std::string longText(5000, 'x');
+    bool wroteAll = false;
     {
-        ol::LineWriter file(path, false);
+        ol::LineWriter file(path, false, wroteAll);
         const float rgb[] = {0.0625F, -1.0F, 1e9F};
         const int sizes[] = {2, std::numeric_limits<int>::min(), std::numeric_limits<int>::max()};
         file.text("size ").integer(33).text({}).endLine();
@@ -26,6 +27,7 @@ TEST(LineWriter, PutsALineTogether) {
         file.endLine();
         file.text("unfinished");
     }
+    EXPECT_TRUE(wroteAll);
     EXPECT_EQ(readFile(path),
               "size 33\n0.500000|0.062500 -1.000000 1000000000.000000\n"
               "2 -2147483648 2147483647\n" +
@@ -34,12 +36,14 @@ TEST(LineWriter, PutsALineTogether) {
 
 TEST(LineWriter, HandsOverLinesOrBlocks) {
     const TempFolder folder;
-    ol::LineWriter lines(folder.path("lines"), true);
+    bool wroteAll = true;
+    ol::LineWriter lines(folder.path("lines"), true, wroteAll);
+    EXPECT_FALSE(wroteAll) << "not yet";
     lines.text("one").endLine();
     lines.text("two");
     EXPECT_EQ(readFile(folder.path("lines")), "one\n");
 
-    ol::LineWriter blocks(folder.path("blocks"), false);
+    ol::LineWriter blocks(folder.path("blocks"), false, wroteAll);
     blocks.text("one").endLine();
     EXPECT_EQ(readFile(folder.path("blocks")), "");
     const std::string line(1000, 'x');
@@ -51,9 +55,10 @@ TEST(LineWriter, HandsOverLinesOrBlocks) {
 TEST(LineWriter, EmptiesTheFileOrSaysThatItCannot) {
     const TempFolder folder;
     const std::string path = folder.write("old", "old text");
-    { const ol::LineWriter file(path, true); }
+    bool wroteAll = false;
+    { const ol::LineWriter file(path, true, wroteAll); }
     EXPECT_EQ(readFile(path), "");
-    EXPECT_EQ(messageOf([&] { ol::LineWriter(folder.path("none/file"), true); }),
+    EXPECT_EQ(messageOf([&] { ol::LineWriter(folder.path("none/file"), true, wroteAll); }),
               "unable to open file for writing");
 }
 
