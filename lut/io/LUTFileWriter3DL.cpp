@@ -37,9 +37,12 @@ void expectCube(const LUT& lut) {
     if (lut.width() > 65) throw Exception("unable to write: cube size may be at most 65");
 }
 
-float optionalNumber(const Property::PropertySet& properties, const char* name, float byDefault) {
+/// @param unusable  what to say of a property of another kind or length, which counts as missing
+float optionalNumber(const Property::PropertySet& properties, const char* name, float byDefault,
+                     const char* unusable) {
     const auto property = properties.find(name);
     const auto* number = Property::asDouble(property.get(), 1);
+    if (property && number == nullptr) warn(unusable);
     return number == nullptr ? byDefault : static_cast<float>(number->values[0]);
 }
 
@@ -58,8 +61,12 @@ Settings findSettings(const Property::PropertySet& properties) {
         requireInt(properties, "outputBitDepth", "unable to find output bitdepth to write");
     found.clampsOutput =
         requireInt(properties, "clampOutput", "unable to find clamp property") != 0;
-    found.scale = optionalNumber(properties, "scale", 1.0F);
-    found.offset = optionalNumber(properties, "offset", 0.0F);
+    found.scale =
+        optionalNumber(properties, "scale", 1.0F,
+                       "Warning: 3DL scale is not a Double of one value, writing unscaled");
+    found.offset =
+        optionalNumber(properties, "offset", 0.0F,
+                       "Warning: 3DL offset is not a Double of one value, writing without");
     return found;
 }
 

@@ -224,9 +224,13 @@ TEST(ThreeDLWriter, TakesAPropertyOfTheWrongKindForMissing) {
               "unable to find input bitdepth to write");
     ol::LUTFileWriter3DL wrongScale;
     setProperty<op::Int>(wrongScale, "scale", 0);
-    setProperty<op::Int>(wrongScale, "offset", 100);
+    wrongScale.setProperty("offset", boost::make_shared<op::Double>("offset", 2U));
     Writing3DL{"flame"}(wrongScale);
-    EXPECT_EQ(written(wrongScale, codeLattice()), readFile(dataPath("3dl/flame.3dl")));
+    std::string warnings;
+    EXPECT_EQ(written(wrongScale, codeLattice(), &warnings), readFile(dataPath("3dl/flame.3dl")));
+    EXPECT_EQ(warnings.substr(0, warnings.find("Warning: Flame")),
+              "Warning: 3DL scale is not a Double of one value, writing unscaled\n"
+              "Warning: 3DL offset is not a Double of one value, writing without\n");
 }
 
 TEST(ThreeDLWriter, GathersTheSameBytesInBlocks) {
