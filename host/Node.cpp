@@ -210,6 +210,7 @@ void Node::execute() {
         zefra::Executable* const executable = op_->asExecutable();
         if (executable == nullptr) throw Error(name_ + ": there is nothing to execute");
         expectConnectedInputs();
+        ++executions_;
         executable->execute();
     } catch (const std::bad_alloc&) {
         error("not enough memory");

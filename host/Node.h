@@ -60,6 +60,10 @@ public:
     /// Runs the operator. Whatever fails, this node's errors say so.
     void execute();
 
+    /// How often the operator has been run since the count was cleared.
+    int executions() const { return executions_; }
+    void clearExecutions() { executions_ = 0; }
+
     /// The failures since the last call, oldest first.
     std::vector<std::string> takeErrors();
     std::size_t errorCount() const { return errors_.size(); }
@@ -94,6 +98,7 @@ private:
     std::vector<Node*> sources_;
     std::vector<std::string> errors_;
     ProgressDisplay* progress_ = nullptr;
+    int executions_ = 0;
     int changeDepth_ = 0;
     int scriptDepth_ = 0;
 };

@@ -24,9 +24,6 @@ public:
 /// Ends a command with status 130.
 class Cancelled {};
 
-/// One line "orlith: warning: ..." on standard error.
-void warn(const std::string& text);
-
 // Each adds its command to the program; running it leaves the exit status in `status`.
 void addPattern(CLI::App& program, int& status);
 void addGenerate(CLI::App& program, int& status);

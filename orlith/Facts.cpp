@@ -83,6 +83,9 @@ Facts factsOf(const ol::LUT& lut) {
         point.advanceRedFastest(size);
     });
     for (unsigned c = 0; c < 3; ++c) {
+        if (facts.min[c] > facts.max[c]) {
+            facts.min[c] = facts.max[c] = std::numeric_limits<float>::quiet_NaN();
+        }
         if (lut.is1D()) {
             Direction direction;
             for (int i = 0; i < lut.width(); ++i)

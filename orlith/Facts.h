@@ -13,8 +13,8 @@ Orlith::LUT::RGB inputColour(const Orlith::LUT::LUT& lut, int r, int g, int b);
 
 /// What the samples of a table say of it as a whole.
 struct Facts {
-    Orlith::LUT::RGB min;  ///< smallest and largest sample of each channel; NaN is passed over
-    Orlith::LUT::RGB max;
+    Orlith::LUT::RGB min;  ///< smallest and largest sample of each channel; NaN is passed over,
+    Orlith::LUT::RGB max;  ///< and is the result where there is nothing else
     double identityDeviation = 0.0;  ///< largest distance of a sample from its
                                      ///< input colour; infinite where there is a NaN
     std::array<bool, 3> isMonotone = {true, true, true};  ///< each channel along its own axis

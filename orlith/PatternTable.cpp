@@ -6,6 +6,7 @@
 #include <cstdint>
 
 #include "orlith/Command.h"
+#include "orlith/Messages.h"
 #include "zefra/PatternLayout.h"
 #include "zefra/Row.h"
 

@@ -2,13 +2,20 @@
 
 #include <fmt/format.h>
 
+#include <unistd.h>
+
+#include <boost/algorithm/string/case_conv.hpp>
+#include <cerrno>
 #include <cmath>
 #include <filesystem>
 #include <stdexcept>
+#include <system_error>
 
 #include "lut/Exception.h"
 #include "lut/io/Registry.h"
 #include "orlith/Command.h"
+#include "orlith/Messages.h"
+#include "orlith/Options.h"
 
 namespace orlith {
 namespace {
@@ -22,7 +29,7 @@ std::string parseOutputBitDepth(const std::string& text, int& bits) {
         bits = ReadOptions::kDetect;
     } else if (text == "input") {
         bits = ReadOptions::kAsInput;
-    } else if (!CLI::detail::lexical_cast(text, bits) || bits < 1 || bits > 31) {
+    } else if (!parseInteger(text, bits) || bits < 1 || bits > 31) {
         return "has to be detect, input or a number of bits from 1 to 31";
     }
     return "";
@@ -37,15 +44,28 @@ void setReaderProperties(ol::LUTFileReader& reader, const ReadOptions& options) 
         property::makeProperty<property::Int>("normalizeOutput", options.normalizeOutput ? 1 : 0));
 }
 
-/// The place of a failure: the path, and the line where there is one.
-std::string place(const std::string& path, const ol::LUTFileReader& reader) {
-    return reader.lineNumber() == 0 ? path : fmt::format("{}:{}", path, reader.lineNumber());
+/// The place of a failure: the file, and the line where there is one.
+std::string place(const std::string& name, const ol::LUTFileReader& reader) {
+    return reader.lineNumber() == 0 ? name : fmt::format("{}:{}", name, reader.lineNumber());
+}
+
+/// Answers for the commonest mistakes in the system's words.
+void expectReadableFile(const std::string& path, const std::string& name) {
+    std::error_code ignored;
+    if (std::filesystem::is_directory(path, ignored)) throw Failure(name + ": is a folder");
+    if (access(path.c_str(), R_OK) != 0) {
+        throw Failure(fmt::format("{}: {}", name, std::generic_category().message(errno)));
+    }
+}
+
+std::string sampleCounts(const Table& table) {
+    return fmt::format("{}: holds {} samples, its table has {} points", table.name,
+                       table.samplesRead, table.pointCount);
 }
 
 }  // namespace
 
 void addFromOption(CLI::App& command, ReadOptions& options) {
-    options.hasFromOption = true;
     command
         .add_option_function<std::string>(
             "--from", [&](const std::string& extension) { options.from = withDot(extension); },
@@ -54,6 +74,8 @@ void addFromOption(CLI::App& command, ReadOptions& options) {
 }
 
 void addReadOptions(CLI::App& command, ReadOptions& options) {
+    command.add_flag("--strict", options.isStrict,
+                     "Go by the letter of the format, as the library's calls do");
     command
         .add_option("--read-format-3dl", options.format3DL, "Dialect of a .3dl file that is read")
         ->check(CLI::IsMember({"auto", "flame", "lustre", "scratch"}))
@@ -76,10 +98,26 @@ std::string withDot(const std::string& extension) {
 }
 
 std::string formatOf(const std::string& path, const std::string& givenExtension) {
-    if (!givenExtension.empty()) return givenExtension;
-    std::string extension;
-    ol::splitExtension(path, nullptr, &extension);
+    std::string extension = givenExtension;
+    if (extension.empty()) ol::splitExtension(path, nullptr, &extension);
+    boost::algorithm::to_lower(extension, std::locale::classic());
     return extension;
+}
+
+bool isReadable(const std::string& extension) {
+    try {
+        return ol::createReader("", true, extension) != nullptr;
+    } catch (const ol::Exception&) {
+        return false;
+    }
+}
+
+std::string formatProblem(const char* message, const std::string& extension, const char* option) {
+    std::string text = message;
+    if (const std::size_t place = text.find("%s"); place != std::string::npos) {
+        text.replace(place, 2, extension);
+    }
+    return fmt::format("{} (name the format by {})", text, option);
 }
 
 std::uint64_t pointCount(const ol::LUT& lut) {
@@ -101,27 +139,31 @@ std::string colourText(const float* rgb) {
     return fmt::format("{} {} {}", text(rgb[0]), text(rgb[1]), text(rgb[2]));
 }
 
-Table readTable(const std::string& path, const ReadOptions& options) {
+Table readTable(const std::string& path, const ReadOptions& options, const std::string& name) {
+    const bool isStandardInput = path == "-";
+    const std::string file = isStandardInput ? "/dev/stdin" : path;
     Table table;
+    table.name = !name.empty() ? name : isStandardInput ? "standard input" : path;
     table.extension = formatOf(path, options.from);
     boost::shared_ptr<ol::LUTFileReader> reader;
     try {
-        reader = ol::createReader(path, !options.from.empty(), options.from);
+        reader = ol::createReader(file, true, table.extension);
     } catch (const ol::Exception& exception) {
-        throw Failure(fmt::format("{}: {} (\"{}\"{})", path, exception.message(), table.extension,
-                                  options.hasFromOption ? "; name the format by --from" : ""));
+        throw Failure(fmt::format("{}: {}", table.name,
+                                  formatProblem(exception.message(), table.extension, "--from")));
     }
-    if (std::filesystem::is_directory(path)) throw Failure(path + ": is a folder");
+    expectReadableFile(file, table.name);
     setReaderProperties(*reader, options);
     try {
-        table.lut = reader->read(path);
+        table.lut = reader->read(file);
     } catch (const ol::Exception& exception) {
-        throw Failure(fmt::format("{}: {}", place(path, *reader), exception.message()));
+        throw Failure(fmt::format("{}: {}", place(table.name, *reader), exception.message()));
     } catch (const std::length_error&) {
         throw Failure(
-            fmt::format("{}: declares a size that no table can have", place(path, *reader)));
+            fmt::format("{}: declares a size that no table can have", place(table.name, *reader)));
     } catch (const std::bad_alloc&) {
-        throw Failure(fmt::format("{}: needs more memory than there is", place(path, *reader)));
+        throw Failure(
+            fmt::format("{}: needs more memory than there is", place(table.name, *reader)));
     }
     table.samplesRead = reader->sampleCount();
     table.pointCount = pointCount(*table.lut);
@@ -130,10 +172,14 @@ Table readTable(const std::string& path, const ReadOptions& options) {
 
 Table readTableAndWarn(const std::string& path, const ReadOptions& options) {
     Table table = readTable(path, options);
-    if (table.samplesRead != table.pointCount) {
-        warn(fmt::format("{}: holds {} samples, its table has {} points", path, table.samplesRead,
-                         table.pointCount));
-    }
+    if (table.samplesRead != table.pointCount) warn(sampleCounts(table));
+    return table;
+}
+
+Table readWholeTable(const std::string& path, const ReadOptions& options) {
+    Table table = readTable(path, options);
+    if (!table.isFilled()) throw Failure(sampleCounts(table));
+    if (table.samplesRead != table.pointCount) warn(sampleCounts(table));
     return table;
 }
 

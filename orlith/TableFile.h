@@ -9,10 +9,10 @@
 
 namespace orlith {
 
-/// How a table file is read: --from and the options of .3dl files, which others ignore.
+/// How a table file is read: --from, --strict, and the options of .3dl files, which others ignore.
 struct ReadOptions {
-    std::string from;  ///< extension with its dot; empty: the file's own
-    bool hasFromOption = false;
+    std::string from;       ///< extension with its dot; empty: the file's own
+    bool isStrict = false;  ///< by the book: a file with too few samples is a table too
     std::string format3DL = "auto";
     int outputBitDepth = kDetect;
     bool normalizeOutput = false;
@@ -27,6 +27,7 @@ void addReadOptions(CLI::App& command, ReadOptions& options);
 /// A table and what its file said of it.
 struct Table {
     boost::shared_ptr<Orlith::LUT::LUT> lut;
+    std::string name;  ///< of the file, for people
     std::string extension;
     std::uint64_t samplesRead = 0;
     std::uint64_t pointCount = 0;  ///< of the table
@@ -35,11 +36,16 @@ struct Table {
 };
 
 /// Reads a table without a word about what the file lacks.
+/// @param path      "-": standard input
+/// @param name      what failures call the file; empty: its path
 /// @throws Failure  the file's name, the line, and the library's message
-Table readTable(const std::string& path, const ReadOptions& options);
+Table readTable(const std::string& path, const ReadOptions& options, const std::string& name = "");
 
 /// Reads a table, and warns where its file held fewer or more samples than it has points.
 Table readTableAndWarn(const std::string& path, const ReadOptions& options);
+
+/// Likewise, but fewer samples are a failure: what is missing is no black.
+Table readWholeTable(const std::string& path, const ReadOptions& options);
 
 /// Points of a table.
 std::uint64_t pointCount(const Orlith::LUT::LUT& lut);
@@ -53,7 +59,14 @@ std::string colourText(const float* rgb);
 /// An extension as the library wants it: with its dot.
 std::string withDot(const std::string& extension);
 
-/// The format of a path: its own extension, unless one is given.
+/// The format of a path: its own extension in small letters, unless one is given.
 std::string formatOf(const std::string& path, const std::string& givenExtension);
+
+/// Whether there is a reader for a format.
+bool isReadable(const std::string& extension);
+
+/// The library's text about an unknown extension, with the extension in it.
+/// @param option  names the format where the file's name does not
+std::string formatProblem(const char* message, const std::string& extension, const char* option);
 
 }  // namespace orlith

@@ -7,6 +7,7 @@
 #include <optional>
 
 #include "orlith/Command.h"
+#include "orlith/Messages.h"
 #include "orlith/TableFile.h"
 
 namespace orlith {
@@ -63,7 +64,7 @@ bool sameSize(const ol::LUT& a, const ol::LUT& b) {
 }
 
 /// Compares the pre-LUT, where the format keeps the table's outputShaper as it is.
-void verifyPreLUT(const std::string& path, const std::string& extension, const ol::LUT& read,
+void verifyPreLUT(const std::string& name, const std::string& extension, const ol::LUT& read,
                   const ol::LUT& table) {
     const bool isKept = extension == ".cub" || extension == ".cms";
     if (!isKept) return;
@@ -81,66 +82,65 @@ void verifyPreLUT(const std::string& path, const std::string& extension, const o
                 agreesAll && (same || std::fabs(back - value) <= textTolerance(value) * 2.0);
         }
     }
-    if (!agreesAll) throw Failure(path + ": read back, its pre-LUT differs from the table's");
+    if (!agreesAll) throw Failure(name + ": read back, its pre-LUT differs from the table's");
 }
 
-Table readBack(const std::string& path, const ReadOptions& options) {
+Table readBack(const std::string& path, const ReadOptions& options, const std::string& name) {
     try {
-        return readTable(path, options);
+        return readTable(path, options, name);
     } catch (const Failure& failure) {
-        throw Failure(
-            fmt::format("{} (while reading back what was written; disk full?)", failure.what()));
+        throw Failure(fmt::format("{} (while reading back what was written)", failure.what()));
     }
 }
 
 }  // namespace
 
-Verification verify(const std::string& path, const std::string& extension, const ol::LUT& table,
-                    const Options3DL& options) {
-    if (extension == ".blut" && table.width() > kWidestBLUT) {
-        return {false,
-                fmt::format("a .blut of more than {} points cannot be read back", kWidestBLUT),
-                0.0};
-    }
+std::string whyUnreadable(const std::string& extension, const ol::LUT& table) {
+    if (extension != ".blut" || table.width() <= kWidestBLUT) return "";
+    return fmt::format("a .blut file of more than {} points a side cannot be read", kWidestBLUT);
+}
+
+Verification verify(const std::string& path, const std::string& name, const std::string& extension,
+                    const ol::LUT& table, const Options3DL& options) {
     ReadOptions reading;
     reading.from = extension;
     reading.format3DL = options.dialect;
     // A Lustre file says its bits itself, and the reader warns when it is told again.
     reading.outputBitDepth =
         options.dialect == "lustre" ? ReadOptions::kDetect : options.outputBits;
-    const Table back = readBack(path, reading);
+    const Table back = readBack(path, reading, name);
     if (!sameSize(*back.lut, table)) {
-        throw Failure(fmt::format("{}: read back, it has {} instead of {}", path,
+        throw Failure(fmt::format("{}: read back, it has {} instead of {}", name,
                                   sizeText(*back.lut), sizeText(table)));
     }
     if (back.samplesRead != back.pointCount) {
-        throw Failure(fmt::format("{}: read back, it holds {} samples instead of {} (disk full?)",
-                                  path, back.samplesRead, back.pointCount));
+        throw Failure(fmt::format("{}: read back, it holds {} samples instead of {}", name,
+                                  back.samplesRead, back.pointCount));
     }
     const float* const read = back.lut->data();
     const float* const written = table.data();
     Verification result;
     for (std::uint64_t i = 0; i < 3 * back.pointCount; ++i) {
         if (!agrees(read[i], written[i], extension, options)) {
-            throw Failure(fmt::format("{}: read back, sample {} is {} instead of {}", path, i / 3,
+            throw Failure(fmt::format("{}: read back, sample {} is {} instead of {}", name, i / 3,
                                       read[i], written[i]));
         }
         const double deviation =
             std::fabs(static_cast<double>(read[i]) - static_cast<double>(written[i]));
         if (deviation > result.largestDeviation) result.largestDeviation = deviation;
     }
-    verifyPreLUT(path, extension, *back.lut, table);
+    verifyPreLUT(name, extension, *back.lut, table);
     result.isVerified = true;
     return result;
 }
 
-std::string summary(const std::string& path, const std::string& extension, const ol::LUT& table,
+std::string summary(const std::string& name, const std::string& extension, const ol::LUT& table,
                     const Verification& verification) {
     const std::string outcome =
         verification.isVerified
             ? fmt::format("largest deviation {:.2g}", verification.largestDeviation)
             : fmt::format("not verified: {}", verification.reason);
-    return fmt::format("{}: {}, {}, {}\n", path, extension, sizeText(table), outcome);
+    return fmt::format("{}: {}, {}, {}\n", printable(name), extension, sizeText(table), outcome);
 }
 
 }  // namespace orlith

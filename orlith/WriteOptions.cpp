@@ -1,6 +1,7 @@
 #include "orlith/WriteOptions.h"
 
 #include "lut/RampFill.h"
+#include "orlith/Options.h"
 
 namespace orlith {
 namespace {
@@ -16,9 +17,9 @@ constexpr int kDefaultPreLUTEntries = 1024;
 
 }  // namespace
 
-const std::vector<int>& bitDepths() {
-    static const std::vector<int> bits = {4, 8, 10, 12, 16};
-    return bits;
+const std::vector<std::string>& bitDepthWords() {
+    static const std::vector<std::string> words = {"4", "8", "10", "12", "16"};
+    return words;
 }
 
 Options3DL WriteOptions::options3DL() const {
@@ -34,9 +35,14 @@ Options3DL WriteOptions::options3DL() const {
 }
 
 void addWriteOptions(CLI::App& command, WriteOptions& options) {
-    command.add_option("--bitdepth", options.bitDepth, "Bits of the input grid of a .3dl file")
-        ->check(CLI::IsMember(bitDepths()))
-        ->capture_default_str();
+    command
+        .add_option_function<std::string>(
+            "--bitdepth", [&](const std::string& text) { options.bitDepth = std::stoi(text); },
+            "Bits of the input grid of a .3dl file (10)")
+        ->check(CLI::IsMember(bitDepthWords()))
+        ->type_name("BITS");
+    std::vector<std::string> outputDepths = bitDepthWords();
+    outputDepths.emplace_back("input");
     command
         .add_option_function<std::string>(
             "--output-bitdepth",
@@ -44,22 +50,27 @@ void addWriteOptions(CLI::App& command, WriteOptions& options) {
                 options.outputBitDepth = text == "input" ? 0 : std::stoi(text);
             },
             "Bits of the codes of a .3dl file, or input (default)")
-        ->check(CLI::IsMember({"input", "4", "8", "10", "12", "16"}))
+        ->check(CLI::IsMember(outputDepths))
         ->type_name("BITS");
     command.add_flag("--clamp-output,!--no-clamp-output", options.clampOutput,
                      "Clamp the codes of a .3dl file to their bits (default)");
     command.add_option("--format-3dl", options.format3DL, "Dialect of a .3dl file")
         ->check(CLI::IsMember({"flame", "lustre", "scratch"}))
         ->capture_default_str();
-    command.add_option("--scale", options.scale, "Multiplies the codes of a .3dl file");
-    command.add_option("--offset", options.offset, "Added to the codes of a .3dl file");
+    addReal(command, "--scale", "Multiplies the codes of a .3dl file",
+            [&](double scale) { options.scale = scale; });
+    addReal(command, "--offset", "Added to the codes of a .3dl file",
+            [&](double offset) { options.offset = offset; });
     command
-        .add_option("--lut1d", options.lut1d,
-                    "Entries of a pre-LUT for a table that has none (1024)")
-        ->check(CLI::Range(2, 1 << 24));
+        .add_option_function<std::string>(
+            "--lut1d", [&](const std::string& text) { options.lut1d = std::stoi(text); },
+            "Entries of a pre-LUT for a table that has none (1024); 0: none")
+        ->check(wrongPreLUTSize)
+        ->type_name("N");
     command
-        .add_option("--style1d", options.style1d,
-                    "Ramp of that pre-LUT: linear or logarithmic (default)")
+        .add_option(
+            "--style1d", options.style1d,
+            "Ramp of that pre-LUT: linear, or logarithmic, which is a smooth step (default)")
         ->check(CLI::IsMember({"linear", "logarithmic"}));
 }
 

@@ -3,6 +3,7 @@
 #include <CLI/CLI.hpp>
 #include <optional>
 #include <string>
+#include <vector>
 
 #include "lut/LUT.h"
 #include "lut/io/LUTFileWriter.h"
@@ -45,7 +46,7 @@ void addPreLUT(Orlith::LUT::LUT& lut, const WriteOptions& options);
 /// Makes a ramp from 0 to 1 the outputShaper of a table, as the operator does.
 void setPreLUT(Orlith::LUT::LUT& lut, int entryCount, const std::string& style);
 
-/// The bit depths that a .3dl file is written with.
-const std::vector<int>& bitDepths();
+/// The bit depths that a .3dl file is written with, as the command line has them.
+const std::vector<std::string>& bitDepthWords();
 
 }  // namespace orlith

@@ -1,12 +1,19 @@
+#include <fcntl.h>
 #include <fmt/format.h>
+#include <unistd.h>
 
+#include <algorithm>
+#include <cerrno>
 #include <cstdio>
 #include <new>
+#include <system_error>
 
 #include "host/Host.h"
 #include "lut/Exception.h"
-#include "orlith/Cancellation.h"
 #include "orlith/Command.h"
+#include "orlith/Messages.h"
+#include "orlith/Options.h"
+#include "orlith/Signals.h"
 
 namespace orlith {
 namespace {
@@ -16,22 +23,85 @@ constexpr char kDescription[] =
     "compares "
     "them.\nExit status: 0 done, 1 failed, 2 wrong usage, 130 cancelled.";
 
+/// Where a standard stream is closed, the next file that is opened would take its place and get
+/// what is printed. Something that refuses to be used takes it instead.
+void holdStandardStreams() {
+    for (const int stream : {STDIN_FILENO, STDOUT_FILENO, STDERR_FILENO}) {
+        if (fcntl(stream, F_GETFD) >= 0 || errno != EBADF) continue;
+        // The lowest free number is this stream's.
+        static_cast<void>(open("/dev/null", stream == STDIN_FILENO ? O_WRONLY : O_RDONLY) == 0);
+    }
+}
+
 /// What fails because the user has cancelled is no failure.
 int fail(int status, const std::string& text) {
     if (host::Host::cancelRequested()) return kCancelled;
-    fmt::print(stderr, "orlith: error: {}\n", text);
+    printError(text);
     return status;
+}
+
+std::vector<std::string> commandNames(const CLI::App& program) {
+    std::vector<std::string> names;
+    for (const CLI::App* const command : program.get_subcommands({}))
+        names.push_back(command->get_name());
+    return names;
+}
+
+std::vector<std::string> optionNames(const CLI::App& command) {
+    std::vector<std::string> names;
+    for (const CLI::Option* const option : command.get_options()) {
+        for (const std::string& name : option->get_lnames())
+            names.push_back("--" + name);
+    }
+    return names;
+}
+
+std::string withNearest(const std::string& problem, const std::string& word,
+                        const std::vector<std::string>& names) {
+    const auto nearest = nearestName(word, names);
+    return nearest ? fmt::format("{} \"{}\"; did you mean \"{}\"?", problem, word, *nearest)
+                   : fmt::format("{} \"{}\"", problem, word);
+}
+
+/// Answers for a first word that is neither a command nor an option.
+void expectKnown(const CLI::App& program, const std::string& word) {
+    const bool isOption = word.rfind('-', 0) == 0;
+    const auto names = isOption ? optionNames(program) : commandNames(program);
+    if (word == "-h" || std::find(names.begin(), names.end(), word) != names.end()) return;
+    const char* const problem = isOption ? "unknown option" : "unknown command";
+    throw UsageError(withNearest(problem, word, names) + " (see orlith --help)");
+}
+
+/// What is wrong with the command line, and where to read how it is right.
+std::string usageProblem(const CLI::App& program, const CLI::ParseError& error) {
+    const auto chosen = program.get_subcommands();
+    if (chosen.empty()) return "a command is needed (see orlith --help)";
+    const CLI::App& command = *chosen.front();
+    std::string problem = error.what();
+    const auto surplus = program.remaining(true);
+    if (!surplus.empty() && surplus.front().rfind("--", 0) == 0) {
+        const std::string word = surplus.front().substr(0, surplus.front().find('='));
+        problem = withNearest("unknown option", word, optionNames(command));
+    }
+    return fmt::format("{} (see orlith --help and orlith {} --help)", problem, command.get_name());
+}
+
+/// Standard output may be a full disk or closed.
+int failToPrint(int error) {
+    return fail(kFailed, fmt::format("standard output cannot be written: {}",
+                                     std::generic_category().message(error)));
 }
 
 /// Runs the command line; every failure ends here as one line and an exit status.
 int run(CLI::App& program, int argc, char** argv, const int& status) {
     try {
+        expectKnown(program, argc > 1 ? argv[1] : "--help");
         program.parse(argc, argv);
         return status;
     } catch (const CLI::Success& request) {  // --help, --version
         return program.exit(request);
     } catch (const CLI::ParseError& error) {
-        return fail(kWrongUsage, error.what());
+        return fail(kWrongUsage, usageProblem(program, error));
     } catch (const UsageError& error) {
         return fail(kWrongUsage, error.what());
     } catch (const Cancelled&) {
@@ -40,21 +110,20 @@ int run(CLI::App& program, int argc, char** argv, const int& status) {
         return fail(kFailed, exception.message());
     } catch (const std::bad_alloc&) {
         return fail(kFailed, "out of memory");
+    } catch (const std::system_error& error) {  // as {fmt} reports what it could not print
+        return std::ferror(stdout) != 0 ? failToPrint(error.code().value())
+                                        : fail(kFailed, error.what());
     } catch (const std::exception& error) {
         return fail(kFailed, error.what());
     }
 }
 
 }  // namespace
-
-void warn(const std::string& text) {
-    fmt::print(stderr, "orlith: warning: {}\n", text);
-}
-
 }  // namespace orlith
 
 int main(int argc, char** argv) {
-    orlith::catchInterrupts();
+    orlith::holdStandardStreams();
+    orlith::catchSignals();
 
     int status = orlith::kDone;
     CLI::App program(orlith::kDescription, "orlith");
@@ -70,9 +139,9 @@ int main(int argc, char** argv) {
     orlith::addPanel(program, status);
     status = orlith::run(program, argc, argv, status);
     // Results that could not be delivered (a full disk behind a redirection) are a failure.
-    if (std::fflush(stdout) != 0 && status == orlith::kDone) {
-        std::fputs("orlith: error: standard output cannot be written\n", stderr);
-        return orlith::kFailed;
+    errno = 0;
+    if ((std::fflush(stdout) != 0 || std::ferror(stdout) != 0) && status == orlith::kDone) {
+        return orlith::failToPrint(errno != 0 ? errno : EIO);
     }
     return status;
 }

@@ -23,19 +23,19 @@ TEST_F(InspectTest, InfoTellsAPersonWhatIsInAFile) {
               "range           0 0 0.25 to 1 1 0.5\n"
               "from identity   1 at most\n"
               "monotone        red yes, green yes, blue yes\n");
-    folder_.write("curve", "LUT_1D_SIZE 3\n0 1 0\n0.1 0.25 nan\n1 0.5 inf\n");
+    folder_.write("curve", "LUT_1D_SIZE 3\n0 1 nan\n0.1 0.25 nan\n1 0.5 nan\n");
     EXPECT_EQ(output("info curve --from cube --values"),
               "file            curve\n"
               "format          .cube\n"
               "table           1D, 3 entries\n"
               "samples read    3\n"
               "domain          0 0 0 to 1 1 1\n"
-              "range           0 0.25 0 to 1 1 inf\n"
+              "range           0 0.25 nan to 1 1 nan\n"
               "from identity   inf at most\n"
               "monotone        red yes, green no, blue no\n"
-              "0 1 0\n"
+              "0 1 nan\n"
               "0.1 0.25 nan\n"
-              "1 0.5 inf\n");
+              "1 0.5 nan\n");
 }
 
 TEST_F(InspectTest, InfoPrintsOneJsonObject) {
@@ -71,7 +71,11 @@ TEST_F(InspectTest, TinyFilesWithHugeClaimsAreAnsweredAtOnce) {
         {"info claim.cube --values", 1, "",
          WARNING "orlith: error: claim.cube: 64000000 points are too many for --values (at most"
                  " 16777216)\n"},
-        {"eval claim.cube 1 1 1", 0, "0 0 0\n", WARNING},
+        {"eval claim.cube 1 1 1 --strict", 0, "0 0 0\n", WARNING},
+        {"eval claim.cube 1 1 1", 1, "",
+         "orlith: error: claim.cube: holds 1 samples, its table has 64000000 points\n"},
+        {"diff claim.cube surplus.cub", 1, "",
+         "orlith: error: claim.cube: holds 1 samples, its table has 64000000 points\n"},
         {"eval surplus.cub 0 0 0", 0, "1 1 1\n",
          "orlith: warning: surplus.cub: holds 2 samples, its table has 1 points\n"},
     });
@@ -103,6 +107,7 @@ TEST_F(InspectTest, EvalSendsColoursThroughATable) {
         {"eval a.cube 1e-60 +1 1e60", 0, "nan nan nan\n", ""},
         {"eval a.cube 1 1 0x1", 2, "", "orlith: error: \"0x1\" is not a number\n"},
     });
+    EXPECT_EQ(output("eval - 0.25 0.5 0.5 --from .CUBE", kLattice), "0.5 0.25 0.375\n");
     EXPECT_EQ(output("eval a.cube", ""), "");
     EXPECT_EQ(output("eval a.cube", "0 0 0\r\n\n \t1\t0.25 +1e0 \n-1 5 nan"),
               "0 0 0.5\n0.25 1 0.25\nnan nan nan\n");
@@ -142,8 +147,9 @@ TEST_F(InspectTest, DiffComparesTables) {
         {"diff curve2.cube curve3.cube", 1, bent.c_str(), ""},
         {"diff curve3.cube curve2.cube", 1, bent.c_str(), ""},
         {"diff a.cube none", 1, "",
-         "orlith: error: none: No reader found for extension \"%s\". (\"\")\n"},
+         "orlith: error: none: No reader found for extension \"\". (name the format by --from)\n"},
     });
+    EXPECT_EQ(run("diff - b.cube --from cube", read("b.cube")).status, 0);
     // A curve against a lattice with red and green swapped.
     EXPECT_EQ(run("diff a.cube curve2.cube --tolerance 1").status, 0);
     EXPECT_EQ(run("diff a.cube curve2.cube --tolerance 0.9").status, 1);

@@ -45,8 +45,8 @@ Program::Program(const std::string& folder, const std::string& command, const st
     _exit(kExecFailed);
 }
 
-void Program::interrupt() const {
-    EXPECT_EQ(kill(process_, SIGINT), 0);
+void Program::send(int signal) const {
+    EXPECT_EQ(kill(process_, signal), 0);
 }
 
 Outcome Program::wait() {

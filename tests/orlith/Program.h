@@ -25,7 +25,7 @@ public:
     /// @param command  arguments, a blank between any two; '' is an empty one
     Program(const std::string& folder, const std::string& command, const std::string& input = "");
 
-    void interrupt() const;  ///< Ctrl-C
+    void send(int signal) const;  ///< SIGINT: Ctrl-C
     Outcome wait();
 
 private:

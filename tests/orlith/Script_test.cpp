@@ -1,30 +1,10 @@
-// The commands run, panel and pattern, and Ctrl-C.
-
-#include <fcntl.h>
-#include <sys/stat.h>
-#include <unistd.h>
+// The commands run, panel and pattern.
 
 #include "tests/orlith/Program.h"
 
 namespace {
 
-class ScriptTest : public test::ProgramTest {
-protected:
-    /// Makes a FIFO, starts the program, which is to open it for reading, and presses Ctrl-C once
-    /// it has. Then the FIFO gets its contents and its end.
-    test::Outcome interruptWhileReading(const std::string& fifo, const std::string& command,
-                                        const std::string& contents) const {
-        const std::string path = folder_.path(fifo);
-        EXPECT_EQ(mkfifo(path.c_str(), 0600), 0);
-        test::Program program(folder_.path(""), command);
-        const int writing = open(path.c_str(), O_WRONLY);  // waits for the reader
-        program.interrupt();
-        EXPECT_EQ(::write(writing, contents.data(), contents.size()),
-                  static_cast<ssize_t>(contents.size()));
-        close(writing);
-        return program.wait();
-    }
-};
+using ScriptTest = test::ProgramTest;
 
 TEST_F(ScriptTest, RunLoadsNodesAndPressesButtons) {
     test::writePattern(folder_.path("p.exr"), 2);
@@ -35,7 +15,9 @@ TEST_F(ScriptTest, RunLoadsNodesAndPressesButtons) {
                   "GenerateLUT { file second.3dl scratch_compatible false }\n");
     EXPECT_EQ(output("run saved.tcl"), "");
     EXPECT_FALSE(exists("first.cube"));
-    expect("run saved.tcl --press first.generate --press GenerateLUT1.generate", 0, "",
+    expect("run saved.tcl --press first.generate --press GenerateLUT1.generate", 0,
+           "first.cube: .cube, 2 x 2 x 2 points, largest deviation 0\n"
+           "second.3dl: .3dl, 2 x 2 x 2 points, largest deviation 0.00024\n",
            "Warning: Flame/Lustre prefers 3DL files of 17x17x17, 33x33x33, 65x65x65\n");
     EXPECT_EQ(output("eval first.cube 1 1 1"), "0.75 1 0\n");
     test::expectIn(read("second.3dl"), "\n3DMESH\n");
@@ -44,6 +26,10 @@ TEST_F(ScriptTest, RunLoadsNodesAndPressesButtons) {
 TEST_F(ScriptTest, RunSaysWhatIsWrong) {
     folder_.write("bare.tcl", "CMSTestPattern {size 2}\nGenerateLUT {file grade}\n");
     folder_.write("alone.tcl", "GenerateLUT {file grade.cube}\n");
+    folder_.write("empty.tcl", "CMSTestPattern {size 2}\nGenerateLUT {lut1d 2}\n");
+    std::filesystem::create_symlink("/dev/full", folder_.path("full.csp"));
+    folder_.write("full.tcl",
+                  "CMSTestPattern {size 2}\nGenerateLUT {file full.csp}");
     folder_.write("bad.tcl", "\nGenerateLUT {lut1d many}\n");
     expectAll({
         {"run none.tcl", 1, "", "orlith: error: none.tcl: cannot be read\n"},
@@ -58,10 +44,20 @@ TEST_F(ScriptTest, RunSaysWhatIsWrong) {
          " set a \".type\" extension on the file name to indicate what type of file to write.\n"},
         {"run alone.tcl --press GenerateLUT1.generate", 1, "",
          "orlith: error: GenerateLUT1: input 0 is not connected\n"},
+        {"run empty.tcl --press GenerateLUT.generate", 1, "",
+         "orlith: error: GenerateLUT1: nothing was written: its control \"file\" is empty\n"},
+        {"run full.tcl --press GenerateLUT.generate", 1, "",
+         "orlith: error: GenerateLUT1: Error writing LUT file: not all of the file could be"
+         " written\n"},
         {"run alone.tcl --press generate", 2, "",
          "orlith: error: --press: \"generate\" has to be NODE.CONTROL\n"},
         {"run alone.tcl --press Other.generate", 2, "",
          "orlith: error: --press: no node \"Other\"\n"},
+        {"run bare.tcl --press GenerateLUT.generate --press GenerateLUT.file", 2, "",
+         "orlith: warning: GenerateLUT1: Error writing LUT file. Select a file type or set a"
+         " \".type\" extension on the file name so that Zefra can determine the type of file to"
+         " write.\n"
+         "orlith: error: --press: GenerateLUT1 has no button \"file\"\n"},
     });
 }
 
@@ -90,41 +86,6 @@ TEST_F(ScriptTest, PatternAndGenerateGiveTheIdentity) {
     EXPECT_EQ(output("generate p.tif i.blut --quiet"), "");
     test::expectIn(output("info i.blut"), "from identity   0 at most\n");
     EXPECT_EQ(run("pattern none/p.exr").status, 1);
-}
-
-// Ctrl-C.
-
-TEST_F(ScriptTest, CancelledOperatorsWriteNothing) {
-    test::writePattern(folder_.path("p.exr"), 2);
-    const test::Outcome outcome =
-        interruptWhileReading("saved.tcl", "run saved.tcl --press GenerateLUT1.generate",
-                              "Read {file p.exr}\nGenerateLUT {file out.cube}\n");
-    EXPECT_EQ(outcome.status, 130);
-    EXPECT_EQ(outcome.err, "");
-    EXPECT_FALSE(exists("out.cube"));
-}
-
-TEST_F(ScriptTest, CancellingEndsScriptsAndCommandsWithoutOperators) {
-    EXPECT_EQ(interruptWhileReading("s.tcl", "run s.tcl", "while 1 {}\n").status, 130);
-    EXPECT_EQ(interruptWhileReading("a.cube", "eval a.cube 0 0 0", "").status, 130);
-}
-
-TEST_F(ScriptTest, CancellingTakesAwayWhatWasWritten) {
-    folder_.write("a.cube", "LUT_3D_SIZE 20\n0 0 0\n");
-    const std::string path = folder_.path("out.cube");
-    ASSERT_EQ(mkfifo(path.c_str(), 0600), 0);
-    test::Program program(folder_.path(""), "convert a.cube out.cube --no-verify");
-    const int reading = open(path.c_str(), O_RDONLY);  // waits for the writer
-    // It has more to write than a FIFO holds, so it is there to be interrupted.
-    program.interrupt();
-    std::filesystem::remove(path);
-    folder_.write("out.cube", "as if it had been written there");
-    char bytes[4096];
-    while (::read(reading, bytes, sizeof bytes) > 0) {
-    }
-    close(reading);
-    EXPECT_EQ(program.wait().status, 130);
-    EXPECT_FALSE(exists("out.cube"));
 }
 
 }  // namespace

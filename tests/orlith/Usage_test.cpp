@@ -40,17 +40,26 @@ TEST_F(UsageTest, WrongUsageIsOneLineAndStatusTwo) {
     const struct {
         const char *command, *about;
     } kCases[] = {
-        {"", "required"},
+        {"", "a command is needed (see orlith --help)"},
+        {"covnert", "unknown command \"covnert\"; did you mean \"convert\"? (see orlith --help)"},
+        {"xyzzy", "unknown command \"xyzzy\" (see"},
+        {"--hepl", "unknown option \"--hepl\"; did you mean \"--help\"?"},
         {"generate p.exr", "OUT_LUT"},
         {"info a.cube b.cube", "b.cube"},
-        {"info a.cube --jsn", "--jsn"},
+        {"info a.cube --jsn", "unknown option \"--jsn\"; did you mean \"--json\"?"},
         {"pattern p.exr --size 1", "--size"},
         {"generate p.exr o.cube --knob lut1d", "\"lut1d\" has to be NAME=VALUE"},
-        {"convert a.cube b.cms --lut1d 1", "--lut1d"},
+        {"pattern p.exr --size 0x10", "has to be a whole number from 2 to 129"},
+        {"pattern -", "an image goes to a file"},
+        {"convert a.cube b.cms --lut1d 1", "\"1\" has to be 0 (none) or a whole number"},
+        {"generate p.exr o.cms --lut1d 65537", "from 2 to 65536"},
+        {"convert a.cube b.3dl --scale nan", "\"nan\" has to be a number"},
+        {"eval - --from cube", "cannot both come from standard input"},
+        {"diff - - --from cube", "only one of the tables"},
         {"info a.3dl --read-output-bitdepth 32",
          "has to be detect, input or a number of bits from 1 to 31"},
         {"eval a.cube 0 0 x", "\"x\" is not a number"},
-        {"diff a.cube b.cube --tolerance nan", "\"nan\" has to be a number from 0 on"},
+        {"diff a.cube b.cube --tolerance nan", "\"nan\" has to be a number"},
     };
     for (const auto& each : kCases) {
         const test::Outcome outcome = run(each.command);
@@ -63,14 +72,35 @@ TEST_F(UsageTest, WrongUsageIsOneLineAndStatusTwo) {
     EXPECT_FALSE(exists("p.exr"));
 }
 
-TEST_F(UsageTest, ResultsThatCannotBeDeliveredAreAFailure) {
+TEST_F(UsageTest, TheExitStatusCountsWhateverTheStreamsAre) {
     folder_.write("a.cube", "LUT_1D_SIZE 2\n0 0 0\n1 1 1\n");
+    const struct {
+        const char* command;
+        int status;
+        const char* err;
+    } kCases[] = {
+        {"info a.cube 2>err >/dev/full", 1,
+         "orlith: error: standard output cannot be written: No space left on device\n"},
+        {"--help 2>err >/dev/full", 1,
+         "orlith: error: standard output cannot be written: No space left on device\n"},
+        {"info a.cube 2>err >&-", 1,
+         "orlith: error: standard output cannot be written: Bad file descriptor\n"},
+        {"info none.cube 2>/dev/full; s=$?; : >err; exit $s", 1, ""},
+        {"convert none 2>&-; s=$?; : >err; exit $s", 2, ""},
+        // Nothing that is said gets into what is written.
+        {"convert a.cube b.csp --no-verify >&- 2>&-; grep -q '^CSP' b.csp 2>err", 0, ""},
+    };
     const std::string start = "cd '" + folder_.path("") + "' && '" ORLITH_TEST_PROGRAM "' ";
-    for (const std::string command : {"info a.cube", "--help"}) {
-        const int status = std::system((start + command + " 2>err >/dev/full").c_str());
-        EXPECT_EQ(WEXITSTATUS(status), 1) << command;
-        EXPECT_EQ(read("err"), "orlith: error: standard output cannot be written\n");
+    for (const auto& each : kCases) {
+        const int status = std::system((start + each.command).c_str());
+        EXPECT_EQ(WEXITSTATUS(status), each.status) << each.command;
+        EXPECT_EQ(read("err"), each.err) << each.command;
     }
+}
+
+TEST_F(UsageTest, NamesKeepToTheirLine) {
+    expect("info a\x1b[2J\n.cube", 1, "",
+           "orlith: error: a\\x1b[2J\\n.cube: No such file or directory\n");
 }
 
 }  // namespace

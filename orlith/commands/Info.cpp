@@ -8,6 +8,7 @@
 
 #include "orlith/Command.h"
 #include "orlith/Facts.h"
+#include "orlith/Messages.h"
 #include "orlith/TableFile.h"
 
 namespace orlith {
@@ -87,7 +88,7 @@ void printJson(const Table& table, const InfoOptions& options) {
         lut.is1D() ? fmt::format("[{}]", lut.width())
                    : fmt::format("[{}, {}, {}]", lut.width(), lut.height(), lut.depth());
     fmt::print("{{\"file\": {}, \"format\": {}, \"kind\": \"{}\", \"size\": {},\n",
-               jsonText(options.path), jsonText(table.extension), lut.is1D() ? "1D" : "3D", size);
+               jsonText(table.name), jsonText(table.extension), lut.is1D() ? "1D" : "3D", size);
     fmt::print(" \"samples_read\": {},\n", table.samplesRead);
     fmt::print(" \"transform\": {}, \"domain\": {},\n", jsonTransform(lut.transform),
                jsonRange(min, max));
@@ -125,7 +126,7 @@ void printText(const Table& table, const InfoOptions& options) {
     const auto line = [](const char* name, const std::string& value) {
         fmt::print("{:<16}{}\n", name, value);
     };
-    line("file", options.path);
+    line("file", printable(table.name));
     line("format", table.extension);
     line("table", fmt::format("{}, {}", lut.is1D() ? "1D" : "3D", sizeText(lut)));
     line("samples read", fmt::format("{}", table.samplesRead));
@@ -151,7 +152,7 @@ int runInfo(const InfoOptions& options) {
     const Table table = readTableAndWarn(options.path, options.reading);
     if (options.showsValues && table.pointCount > kMostValues) {
         throw Failure(fmt::format("{}: {} points are too many for --values (at most {})",
-                                  options.path, table.pointCount, kMostValues));
+                                  table.name, table.pointCount, kMostValues));
     }
     if (options.isJson) {
         printJson(table, options);

@@ -1,11 +1,13 @@
 #include <fmt/format.h>
 
+#include <cerrno>
 #include <cmath>
 
 #include "lut/Exception.h"
 #include "lut/io/Registry.h"
-#include "orlith/Cancellation.h"
 #include "orlith/Command.h"
+#include "orlith/Messages.h"
+#include "orlith/OutputFile.h"
 #include "orlith/TableFile.h"
 #include "orlith/Verification.h"
 #include "orlith/WriteOptions.h"
@@ -71,39 +73,70 @@ void warnOfLosses(const std::string& output, const std::string& extension, const
     }
 }
 
+boost::shared_ptr<ol::LUTFileWriter> makeWriter(const ConvertOptions& options,
+                                                const std::string& extension) {
+    try {
+        return ol::createWriter("", true, extension);
+    } catch (const ol::Exception& exception) {
+        throw Failure(fmt::format("{}: {}", options.output,
+                                  formatProblem(exception.message(), extension, "--to")));
+    }
+}
+
+/// The library's text, and what to do about it.
+std::string refusal(const ol::Exception& exception, const std::string& extension,
+                    const ol::LUT& lut) {
+    if (extension == ".blut" && lut.is1D()) return "a .blut file is written of lattices only";
+    std::string text = exception.message();
+    if (extension == ".cms" && !lut.is1D() && lut.outputShaper.empty()) {
+        text += " (--lut1d 1024 --style1d linear gives it some)";
+    }
+    return text;
+}
+
+void writeTable(ol::LUTFileWriter& writer, const OutputFile& output, const std::string& extension,
+                const boost::shared_ptr<ol::LUT>& lut) {
+    try {
+        errno = 0;
+        writer.write(output.stagedPath(), lut);
+    } catch (const ol::Exception& exception) {
+        throw Failure(fmt::format("{}: {}", output.name(), refusal(exception, extension, *lut)));
+    }
+    if (!writer.wroteAll()) {
+        throw Failure(fmt::format("{}: not all of the file could be written{}", output.name(),
+                                  writeFailureReason(errno)));
+    }
+}
+
 int runConvert(const ConvertOptions& options) {
     const std::string extension = formatOf(options.output, options.to);
     const Options3DL options3DL = options.writing.options3DL();
-    boost::shared_ptr<ol::LUTFileWriter> writer;
-    try {
-        writer = ol::createWriter(options.output, !options.to.empty(), options.to);
-    } catch (const ol::Exception& exception) {
-        throw Failure(fmt::format("{}: {} (\"{}\"; name the format by --to)", options.output,
-                                  exception.message(), extension));
-    }
+    const auto writer = makeWriter(options, extension);
     setWriterProperties(*writer, options3DL);
     writer->setProperty("flushLines",
                         Orlith::Property::makeProperty<Orlith::Property::Int>("flushLines", 0));
 
-    const Table table = readTableAndWarn(options.input, options.reading);
+    const Table table = readWholeTable(options.input, options.reading);
     dropIdentityPreLUT(*table.lut, extension);
     addPreLUT(*table.lut, options.writing);
-    const CancellableOutput output(options.output);
-    try {
-        writer->write(options.output, table.lut);
-    } catch (const ol::Exception& exception) {
-        throw Failure(fmt::format("{}: {}", options.output, exception.message()));
+    const std::string unreadable = whyUnreadable(extension, *table.lut);
+    if (!unreadable.empty() && !options.reading.isStrict) {
+        throw Failure(fmt::format("{}: {}", options.output, unreadable));
     }
-    warnOfLosses(options.output, extension, *table.lut);
+    OutputFile output(options.output);
+    writeTable(*writer, output, extension, table.lut);
+    warnOfLosses(output.name(), extension, *table.lut);
 
     Verification verification;
-    verification.reason = "--no-verify";
-    if (!options.skipsVerification) {
-        verification = verify(options.output, extension, *table.lut, options3DL);
+    verification.reason = output.whyNotReadBack(options.skipsVerification);
+    if (verification.reason.empty()) verification.reason = unreadable;
+    if (verification.reason.empty()) {
+        verification =
+            verify(output.stagedPath(), output.name(), extension, *table.lut, options3DL);
     }
-    output.expectNotCancelled();
+    output.deliver();
     if (!options.isQuiet) {
-        fmt::print("{}", summary(options.output, extension, *table.lut, verification));
+        output.print(summary(output.name(), extension, *table.lut, verification));
     }
     return kDone;
 }

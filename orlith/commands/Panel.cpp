@@ -3,6 +3,7 @@
 #include "host/Host.h"
 #include "orlith/Command.h"
 #include "orlith/Knobs.h"
+#include "orlith/Messages.h"
 
 namespace orlith {
 namespace {

@@ -1,6 +1,5 @@
 #include <fmt/format.h>
 
-#include <charconv>
 #include <iostream>
 #include <map>
 #include <string>
@@ -9,6 +8,7 @@
 #include "lut/io/text/Numbers.h"
 #include "lut/io/text/Tokens.h"
 #include "orlith/Command.h"
+#include "orlith/Options.h"
 #include "orlith/TableFile.h"
 
 namespace orlith {
@@ -25,10 +25,9 @@ struct EvalOptions {
 };
 
 /// A whole word as a number. Results are compared by machines: a misspelt colour is no black.
-bool parseNumber(std::string_view word, float& number) {
-    if (!word.empty() && word.front() == '+') word.remove_prefix(1);
-    const auto [end, error] = std::from_chars(word.data(), word.data() + word.size(), number);
-    if (error == std::errc::invalid_argument || end != word.data() + word.size()) return false;
+bool parseColour(std::string_view word, float& number) {
+    double parsed = 0.0;
+    if (!parseReal(word, parsed)) return false;
     number = ol::toFloat(word);  // 0 or infinity for numbers that single precision does not hold
     return true;
 }
@@ -46,7 +45,7 @@ void evaluateInput(const ol::LUT& lut, const EvalOptions& options) {
         ol::RGB colour;
         bool isColour = words.count() == 3;
         for (unsigned c = 0; isColour && c < 3; ++c)
-            isColour = parseNumber(words[c], colour[c]);
+            isColour = parseColour(words[c], colour[c]);
         if (!isColour) {
             throw Failure(fmt::format("standard input:{}: expected three numbers", number));
         }
@@ -57,11 +56,15 @@ void evaluateInput(const ol::LUT& lut, const EvalOptions& options) {
 int runEval(const EvalOptions& options) {
     ol::RGB colour;
     for (unsigned c = 0; c < options.colour.size(); ++c) {
-        if (!parseNumber(options.colour[c], colour[c])) {
+        if (!parseColour(options.colour[c], colour[c])) {
             throw UsageError(fmt::format("\"{}\" is not a number", options.colour[c]));
         }
     }
-    const Table table = readTableAndWarn(options.path, options.reading);
+    if (options.path == "-" && options.colour.empty()) {
+        throw UsageError("table and colours cannot both come from standard input");
+    }
+    const Table table = options.reading.isStrict ? readTableAndWarn(options.path, options.reading)
+                                                 : readWholeTable(options.path, options.reading);
     if (options.colour.empty()) {
         evaluateInput(*table.lut, options);
     } else {

@@ -1,15 +1,17 @@
 #include <fmt/format.h>
 
 #include <algorithm>
+#include <cerrno>
 
 #include "host/Host.h"
 #include "host/ProgressDisplay.h"
-#include "orlith/Cancellation.h"
 #include "orlith/Command.h"
+#include "orlith/Generated.h"
 #include "orlith/Knobs.h"
+#include "orlith/Options.h"
+#include "orlith/OutputFile.h"
 #include "orlith/PatternTable.h"
 #include "orlith/TableFile.h"
-#include "orlith/Verification.h"
 #include "orlith/WriteOptions.h"
 
 namespace orlith {
@@ -34,8 +36,9 @@ struct ControlOption {
 
 constexpr ControlOption kControlOptions[] = {
     {"--file-type", "file_type", "EXT", "Format, such as .3dl; an empty text: by the file's name"},
-    {"--lut1d", "lut1d", "N", "Entries of the pre-LUT (1024); not for .3dl"},
-    {"--style1d", "style1d", "STYLE", "Ramp of the pre-LUT: linear or logarithmic (default)"},
+    {"--lut1d", "lut1d", "N", "Entries of the pre-LUT (1024), 0: none; not for .3dl"},
+    {"--style1d", "style1d", "STYLE",
+     "Ramp of the pre-LUT: linear, or logarithmic, which is a smooth step (default)"},
     {"--bitdepth", "bitdepth_id", "BITS", "Bits of a .3dl file's input grid: 4 8 10 12 16 (10)"},
     {"--output-bitdepth", "output_bitdepth_id", "BITS", "Bits of a .3dl file's codes, or input"},
     {"--clamp-output", "clamp_output", nullptr, "Clamp a .3dl file's codes to their bits"},
@@ -54,41 +57,19 @@ std::string menuText(const std::string& control, const std::string& word) {
     return word;
 }
 
-/// The options that a .3dl file was written with, from the operator's controls.
-Options3DL options3DLOf(host::Node& node) {
-    // They show while .3dl is the file type; hidden ones keep their values.
-    node.setValue("file_type", ".3dl");
-    const auto index = [&](const char* name) { return node.findControl(name)->number(); };
-    // The operator takes the last entry for an index beyond them.
-    const auto bits = [](int entry) {
-        return bitDepths()[std::min(static_cast<std::size_t>(entry), bitDepths().size() - 1)];
-    };
-    WriteOptions options;
-    options.bitDepth = bits(index("bitdepth_id"));
-    if (const int output = index("output_bitdepth_id"); output > 0) {
-        options.outputBitDepth = bits(output - 1);
+/// Sets the name, and the file type where only its letters' case keeps the operator from seeing it.
+void setFile(host::Node& node, const std::string& path) {
+    setKnob(node, "file", path);
+    const std::string extension = formatOf(path, "");
+    const auto& types = node.findControl("file_type")->items();
+    const bool isType = std::find(types.begin(), types.end(), extension) != types.end();
+    if (isType && node.findControl("file_type")->number() == 0) {
+        node.setValue("file_type", extension);
     }
-    options.clampOutput = index("clamp_output") != 0;
-    constexpr const char* kDialects[] = {"flame", "lustre", "scratch"};
-    options.format3DL = kDialects[index("format_3dl_id")];
-    return options.options3DL();
-}
-
-/// The pre-LUT that the operator gives to a table.
-void addPreLUT(Orlith::LUT::LUT& lut, const host::Node& node) {
-    const host::PanelControl* const entryCount = node.findControl("lut1d");
-    if (!entryCount->hasValue()) return;  // no pre-LUT in a .3dl file
-    setPreLUT(lut, entryCount->number(), node.value("style1d"));
-}
-
-/// The format that the operator wrote: its file type, or the name's extension where that is blank.
-std::string formatWritten(const host::Node& node, const std::string& path) {
-    const std::string type = node.value("file_type");
-    return formatOf(path, type.find('.') == std::string::npos ? "" : type);
 }
 
 void setControls(host::Node& node, const GenerateOptions& options) {
-    setKnob(node, "file", options.output);
+    setFile(node, options.output);
     for (const auto& [control, word] : options.controls) {
         const host::PanelControl* const found = node.findControl(control);
         if (found == nullptr || !found->hasValue()) {
@@ -101,6 +82,35 @@ void setControls(host::Node& node, const GenerateOptions& options) {
         setKnob(node, name, value);
 }
 
+/// Has the operator write to the staged file, in the type that it would write the file in.
+void setStage(host::Node& node, const OutputFile& output) {
+    const std::string type = node.value("file_type");
+    node.setValue("file", output.stagedPath());
+    node.setValue("file_type", type);
+    // What was said while controls were set does not matter unless the execution fails, which then
+    // has its own word for it.
+    node.takeErrors();
+}
+
+/// @throws Failure  all that the operator and its inputs have to say
+void execute(host::Node& node, const OutputFile& output) {
+    host::ProgressDisplay progress;
+    node.setProgress(&progress);
+    errno = 0;
+    node.execute();
+    const int error = errno;
+    node.setProgress(nullptr);
+    output.expectNotCancelled();
+    const auto errors = node.takeErrors();
+    if (errors.empty()) return;
+    const std::string text = output.inWords(fmt::format("{}", fmt::join(errors, "; ")));
+    // What the input has to say begins with the name of its own file.
+    const bool isAboutOutput = text.rfind("Error ", 0) == 0;
+    throw Failure(isAboutOutput
+                      ? fmt::format("{}: {}{}", output.name(), text, writeFailureReason(error))
+                      : text);
+}
+
 int runGenerate(const GenerateOptions& options) {
     host::Host host;
     host.loadBundles();
@@ -109,39 +119,19 @@ int runGenerate(const GenerateOptions& options) {
     generate.connect(0, read);
     read.setValue("file", options.image);
     setControls(generate, options);
-    // What was said while controls were set does not matter unless the execution fails, which then
-    // has its own word for it.
-    generate.takeErrors();
-    const std::string path = generate.value("file");
-    if (path.empty()) throw UsageError("the output file has no name");
 
     zefra::Iop& image = *read.image();
     image.validate(true);
     checkPattern(options.image, image);
 
-    const CancellableOutput output(path);
-    {
-        host::ProgressDisplay progress;
-        generate.setProgress(&progress);
-        generate.execute();
-        generate.setProgress(nullptr);
-    }
-    output.expectNotCancelled();
-    if (const auto errors = generate.takeErrors(); !errors.empty()) {
-        throw Failure(fmt::format("{}", fmt::join(errors, "; ")));
-    }
-
-    const std::string extension = formatWritten(generate, path);
-    const auto table = tableOfPattern(image);
-    addPreLUT(*table, generate);
-    Verification verification;
-    verification.reason = "--no-verify";
-    if (!options.skipsVerification) {
-        const Options3DL options3DL = extension == ".3dl" ? options3DLOf(generate) : Options3DL();
-        verification = verify(path, extension, *table, options3DL);
-    }
-    output.expectNotCancelled();
-    if (!options.isQuiet) fmt::print("{}", summary(path, extension, *table, verification));
+    OutputFile output(generate.value("file"));
+    setStage(generate, output);
+    execute(generate, output);
+    const std::string line = reportGenerated(
+        generate,
+        {output.stagedPath(), output.name(), output.whyNotReadBack(options.skipsVerification)});
+    output.deliver();
+    if (!options.isQuiet) output.print(line);
     return kDone;
 }
 
@@ -173,8 +163,9 @@ void addGenerate(CLI::App& program, int& status) {
             },
             each.description);
         option->type_name(each.typeName);
+        if (control == "lut1d") option->check(wrongPreLUTSize);
         if (control == "style1d") option->check(CLI::IsMember({"linear", "logarithmic"}));
-        if (control == "bitdepth_id") option->check(CLI::IsMember({"4", "8", "10", "12", "16"}));
+        if (control == "bitdepth_id") option->check(CLI::IsMember(bitDepthWords()));
         if (control == "output_bitdepth_id") {
             option->check(CLI::IsMember({"input", "4", "8", "10", "12", "16"}));
         }

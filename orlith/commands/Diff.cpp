@@ -8,6 +8,7 @@
 #include "lut/io/Lattice.h"
 #include "orlith/Command.h"
 #include "orlith/Facts.h"
+#include "orlith/Options.h"
 #include "orlith/TableFile.h"
 
 namespace orlith {
@@ -79,9 +80,19 @@ void forEachPair(const Table& a, const Table& b, Visit&& visit) {
     });
 }
 
+/// --from is for the table whose name does not tell its format, if the other one's does.
+ReadOptions readingOf(const std::string& path, const ReadOptions& options) {
+    ReadOptions reading = options;
+    if (isReadable(formatOf(path, ""))) reading.from.clear();
+    return reading;
+}
+
 int runDiff(const DiffOptions& options) {
-    const Table a = readTableAndWarn(options.a, options.reading);
-    const Table b = readTableAndWarn(options.b, options.reading);
+    if (options.a == "-" && options.b == "-") {
+        throw UsageError("only one of the tables can come from standard input");
+    }
+    const Table a = readWholeTable(options.a, readingOf(options.a, options.reading));
+    const Table b = readWholeTable(options.b, readingOf(options.b, options.reading));
     Differences channels[3];
     forEachPair(a, b, [&](unsigned c, float x, float y) { channels[c].add(x, y); });
 
@@ -104,14 +115,15 @@ void addDiff(CLI::App& program, int& status) {
     const auto options = std::make_shared<DiffOptions>();
     command->add_option("LUT_A", options->a, "Table to read")->required();
     command->add_option("LUT_B", options->b, "Table to compare it with")->required();
+    addFromOption(*command, options->reading);
     addReadOptions(*command, options->reading);
-    command->add_option("--tolerance", options->tolerance, "Largest difference that is none")
-        ->check([](const std::string& text) {
-            double tolerance = 0.0;
-            const bool isGood = CLI::detail::lexical_cast(text, tolerance) && tolerance >= 0.0;
-            return isGood ? std::string() : "\"" + text + "\" has to be a number from 0 on";
-        })
-        ->capture_default_str();
+    addReal(*command, "--tolerance", "Largest difference that is none, from 0 on (0)",
+            [options](double tolerance) {
+                if (tolerance < 0.0) {
+                    throw CLI::ValidationError("--tolerance", "has to be a number from 0 on");
+                }
+                options->tolerance = tolerance;
+            });
     command->callback([options, &status] { status = runDiff(*options); });
 }
 

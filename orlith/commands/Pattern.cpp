@@ -1,9 +1,12 @@
 #include <fmt/format.h>
 
+#include "host/Error.h"
 #include "host/Host.h"
 #include "host/ImageFile.h"
-#include "orlith/Cancellation.h"
 #include "orlith/Command.h"
+#include "orlith/Messages.h"
+#include "orlith/Options.h"
+#include "orlith/OutputFile.h"
 #include "zefra/PatternLayout.h"
 
 namespace orlith {
@@ -19,16 +22,24 @@ struct PatternOptions {
 };
 
 int runPattern(const PatternOptions& options) {
+    if (options.path == "-") {
+        throw UsageError("an image goes to a file whose name has its format's extension");
+    }
     host::Host host;
     host::Node& node = host.createNode("CMSTestPattern");
     node.setValue("size", std::to_string(options.size));
-    const CancellableOutput output(options.path);
-    host::writeImage(options.path, *node.image());
-    output.expectNotCancelled();
+    OutputFile output(options.path);
+    try {
+        host::writeImage(output.stagedPath(), *node.image());
+    } catch (const host::Error& error) {
+        throw Failure(output.inWords(error.what()));
+    }
+    output.deliver();
     if (!options.isQuiet) {
         const zefra::Box& box = node.image()->box();
-        fmt::print("{}: {} x {} x {} test pattern, {} x {} pixels\n", options.path, options.size,
-                   options.size, options.size, box.width(), box.height());
+        output.print(fmt::format("{}: {} x {} x {} test pattern, {} x {} pixels\n",
+                                 printable(output.name()), options.size, options.size, options.size,
+                                 box.width(), box.height()));
     }
     return kDone;
 }
@@ -41,9 +52,8 @@ void addPattern(CLI::App& program, int& status) {
     const auto options = std::make_shared<PatternOptions>();
     command->add_option("OUT_IMAGE", options->path, "Image to write; EXR keeps every digit")
         ->required();
-    command->add_option("--size", options->size, "Points on each side of the cube")
-        ->check(CLI::Range(kSmallest, kLargest))
-        ->capture_default_str();
+    addInteger(*command, "--size", kSmallest, kLargest, "Points on each side of the cube (33)",
+               [options](int size) { options->size = size; });
     command->add_flag("--quiet", options->isQuiet, "Do not say what was written");
     command->callback([options, &status] { status = runPattern(*options); });
 }

@@ -3,14 +3,19 @@
 #include <filesystem>
 #include <fstream>
 #include <iterator>
+#include <string_view>
 
 #include "host/Host.h"
 #include "host/ProgressDisplay.h"
-#include "orlith/Cancellation.h"
 #include "orlith/Command.h"
+#include "orlith/Generated.h"
+#include "orlith/Messages.h"
+#include "orlith/OutputFile.h"
 
 namespace orlith {
 namespace {
+
+constexpr std::string_view kTableOperator = "GenerateLUT";
 
 struct RunOptions {
     std::string script;
@@ -37,21 +42,50 @@ std::vector<std::string> takeErrors(const host::Host& host) {
     return texts;
 }
 
-void press(host::Host& host, const std::string& target) {
+/// A button to press.
+struct Button {
+    host::Node* node;
+    std::string control;
+};
+
+Button findButton(const host::Host& host, const std::string& target) {
     const std::size_t split = target.rfind('.');
     if (split == std::string::npos || split == 0) {
         throw UsageError(fmt::format("--press: \"{}\" has to be NODE.CONTROL", target));
     }
-    host::Node* const node = host.findNode(target.substr(0, split));
-    if (node == nullptr) {
-        throw UsageError(fmt::format("--press: no node \"{}\"", target.substr(0, split)));
+    const std::string name = target.substr(0, split);
+    host::Node* const node = host.findNode(name);
+    if (node == nullptr) throw UsageError(fmt::format("--press: no node \"{}\"", name));
+    const std::string control = target.substr(split + 1);
+    const host::PanelControl* const button = node->findControl(control);
+    if (button == nullptr || button->kind() != host::PanelControl::Kind::ScriptButton) {
+        throw UsageError(fmt::format("--press: {} has no button \"{}\"", node->name(), control));
     }
+    return {node, control};
+}
+
+void press(host::Host& host, const Button& button) {
     host::ProgressDisplay progress;
     for (const auto& each : host.nodes())
         each->setProgress(&progress);
-    host.press(*node, target.substr(split + 1));
+    host.press(*button.node, button.control);
     for (const auto& each : host.nodes())
         each->setProgress(nullptr);
+    if (host::Host::cancelRequested()) throw Cancelled();
+    if (const auto errors = takeErrors(host); !errors.empty()) {
+        throw Failure(fmt::format("{}", fmt::join(errors, "; ")));
+    }
+}
+
+/// Says what a table's node has written, as generate does.
+void report(host::Node& node) {
+    const std::string path = node.value("file");
+    if (path.empty()) {
+        throw Failure(
+            fmt::format("{}: nothing was written: its control \"file\" is empty", node.name()));
+    }
+    const std::string reason = isStream(path) ? "a pipe or a device is not read back" : "";
+    fmt::print("{}", reportGenerated(node, {path, path, reason}));
 }
 
 int runRun(const RunOptions& options) {
@@ -61,11 +95,15 @@ int runRun(const RunOptions& options) {
     host.runScript(readScript(options.script), options.script);
     for (const std::string& text : takeErrors(host))
         warn(text);
-    for (const std::string& target : options.presses) {
-        press(host, target);
-        if (host::Host::cancelRequested()) throw Cancelled();
-        if (const auto errors = takeErrors(host); !errors.empty()) {
-            throw Failure(fmt::format("{}", fmt::join(errors, "; ")));
+    std::vector<Button> buttons;
+    for (const std::string& target : options.presses)
+        buttons.push_back(findButton(host, target));
+    for (const Button& button : buttons) {
+        for (const auto& node : host.nodes())
+            node->clearExecutions();
+        press(host, button);
+        for (const auto& node : host.nodes()) {
+            if (node->executions() > 0 && node->className() == kTableOperator) report(*node);
         }
     }
     return kDone;

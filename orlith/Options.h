@@ -1,0 +1,36 @@
+#pragma once
+
+#include <CLI/CLI.hpp>
+#include <functional>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace orlith {
+
+/// A whole word as a number, in decimal notation only: "0x10" and "1 " are none, "033" is 33.
+/// @return false, leaving the number alone, if it is none or does not fit
+bool parseInteger(std::string_view word, int& number);
+
+/// Likewise; "nan" and "inf" are numbers here.
+bool parseReal(std::string_view word, double& number);
+
+/// Adds an option that takes an integer within a range.
+CLI::Option* addInteger(CLI::App& command, const std::string& name, int least, int most,
+                        const std::string& description, std::function<void(int)> use);
+
+/// Adds an option that takes a finite number.
+CLI::Option* addReal(CLI::App& command, const std::string& name, const std::string& description,
+                     std::function<void(double)> use);
+
+/// What --lut1d takes: the entries of a pre-LUT, or 0 for none. One entry would have no slope, and
+/// more than 65536 say no more than 16-bit codes can.
+/// @return what is wrong with the word, or an empty text
+std::string wrongPreLUTSize(const std::string& word);
+
+/// The name of a list that is the fewest keystrokes away, if it is few enough to be meant.
+std::optional<std::string> nearestName(const std::string& word,
+                                       const std::vector<std::string>& names);
+
+}  // namespace orlith
