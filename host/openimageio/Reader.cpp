@@ -1,3 +1,4 @@
+#include <OpenImageIO/filesystem.h>
 #include <OpenImageIO/imageio.h>
 #include <OpenImageIO/strutil.h>
 #include <fmt/format.h>
@@ -62,6 +63,25 @@ void expectWholeJPEG(const std::string& path) {
     if (tail.find("\xff\xd9") == std::string::npos) throw Error(path, "is cut off");
 }
 
+/// A file that remembers whether it ended before a read did. DPX needs it: lines of 10 and 12 bits
+/// that are not there are taken to be black. Nothing is read ahead there, so that only what is
+/// missing counts.
+class WatchedFile final : public OIIO::Filesystem::IOFile {
+public:
+    explicit WatchedFile(const std::string& path) : IOFile(path, Read) {}
+
+    const char* proxytype() const override { return "watched file"; }
+    std::size_t read(void* buffer, std::size_t size) override {
+        const std::size_t count = IOFile::read(buffer, size);
+        wasShort_ = wasShort_ || count < size;
+        return count;
+    }
+    bool wasShort() const { return wasShort_; }
+
+private:
+    bool wasShort_ = false;
+};
+
 class Reader final : public ImageReader {
 public:
     explicit Reader(const std::string& path) : path_(path) {
@@ -69,6 +89,7 @@ public:
         wishes["oiio:UnassociatedAlpha"] = 1;  // colours as the file has them
         input_ = OIIO::ImageInput::open(path_, &wishes);
         if (!input_) failReading(path_, OIIO::geterror());
+        if (formatName() == "dpx") reopenWatched(wishes);
         expectPlainImage(input_->spec(), path_);
         frame_ = frameOf(input_->spec());
         channels_ = findChannels(input_->spec());
@@ -77,7 +98,7 @@ public:
     const ImageFrame& frame() const override { return frame_; }
 
     void readPixels(float* rgb) override {
-        if (std::string_view(input_->format_name()) == "jpeg") expectWholeJPEG(path_);
+        if (formatName() == "jpeg") expectWholeJPEG(path_);
         const auto [red, green, blue] = channels_;
         if (green == red + 1 && blue == red + 2) {
             readChannels(red, 3, rgb);
@@ -86,9 +107,21 @@ public:
             readChannels(green, 1, rgb + 1);
             readChannels(blue, 1, rgb + 2);
         }
+        if (file_ && file_->wasShort()) throw Error(path_, "is cut off");
     }
 
 private:
+    std::string_view formatName() const { return input_->format_name(); }
+
+    void reopenWatched(const OIIO::ImageSpec& wishes) {
+        input_->close();
+        file_ = std::make_unique<WatchedFile>(path_);
+        OIIO::ImageSpec ignored;
+        if (!input_->set_ioproxy(file_.get()) || !input_->open(path_, ignored, wishes)) {
+            failReading(path_, input_->geterror());
+        }
+    }
+
     void readChannels(int first, int count, float* target) {
         constexpr OIIO::stride_t kPixelBytes = 3 * sizeof(float);
         if (!input_->read_image(0, 0, first, first + count, OIIO::TypeFloat, target, kPixelBytes) ||
@@ -98,6 +131,7 @@ private:
     }
 
     const std::string path_;
+    std::unique_ptr<WatchedFile> file_;  // where the library has to be watched
     std::unique_ptr<OIIO::ImageInput> input_;
     ImageFrame frame_;
     std::array<int, 3> channels_{};
