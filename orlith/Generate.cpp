@@ -6,6 +6,7 @@
 #include "host/ProgressDisplay.h"
 #include "orlith/Cancellation.h"
 #include "orlith/Command.h"
+#include "orlith/ImageOptions.h"
 #include "orlith/Knobs.h"
 #include "orlith/PatternTable.h"
 #include "orlith/TableFile.h"
@@ -17,6 +18,7 @@ namespace {
 
 struct GenerateOptions {
     std::string image;
+    host::ImageChoice choice;
     std::string output;
     Knobs controls;  // of the options, in the order in which they are set
     Knobs knobs;
@@ -104,10 +106,9 @@ void setControls(host::Node& node, const GenerateOptions& options) {
 int runGenerate(const GenerateOptions& options) {
     host::Host host;
     host.loadBundles();
-    host::Node& read = host.createNode("Read");
+    host::Node& read = createRead(host, options.image, options.choice);
     host::Node& generate = host.createNode("GenerateLUT");
     generate.connect(0, read);
-    read.setValue("file", options.image);
     setControls(generate, options);
     // What was said while controls were set does not matter unless the execution fails, which then
     // has its own word for it.
@@ -115,8 +116,7 @@ int runGenerate(const GenerateOptions& options) {
     const std::string path = generate.value("file");
     if (path.empty()) throw UsageError("the output file has no name");
 
-    zefra::Iop& image = *read.image();
-    image.validate(true);
+    zefra::Iop& image = openImage(read);
     checkPattern(options.image, image);
 
     const CancellableOutput output(path);
@@ -183,6 +183,7 @@ void addGenerate(CLI::App& program, int& status) {
         }
     }
     addKnobOption(*command, options->knobs);
+    addImageChoice(*command, options->choice);
     command->add_flag("--no-verify", options->skipsVerification,
                       "Do not read the written file back to compare it");
     command->add_flag("--quiet", options->isQuiet, "Do not say what was written");

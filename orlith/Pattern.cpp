@@ -4,6 +4,7 @@
 #include "host/ImageFile.h"
 #include "orlith/Cancellation.h"
 #include "orlith/Command.h"
+#include "orlith/ImageOptions.h"
 #include "zefra/PatternLayout.h"
 
 namespace orlith {
@@ -15,6 +16,7 @@ constexpr int kLargest = 129;
 struct PatternOptions {
     std::string path;
     int size = 33;
+    std::string sampleType;
     bool isQuiet = false;
 };
 
@@ -23,7 +25,7 @@ int runPattern(const PatternOptions& options) {
     host::Node& node = host.createNode("CMSTestPattern");
     node.setValue("size", std::to_string(options.size));
     const CancellableOutput output(options.path);
-    host::writeImage(options.path, *node.image());
+    host::writeImage(options.path, *node.image(), options.sampleType);
     output.expectNotCancelled();
     if (!options.isQuiet) {
         const zefra::Box& box = node.image()->box();
@@ -44,6 +46,7 @@ void addPattern(CLI::App& program, int& status) {
     command->add_option("--size", options->size, "Points on each side of the cube")
         ->check(CLI::Range(kSmallest, kLargest))
         ->capture_default_str();
+    addSampleType(*command, options->sampleType);
     command->add_flag("--quiet", options->isQuiet, "Do not say what was written");
     command->callback([options, &status] { status = runPattern(*options); });
 }
