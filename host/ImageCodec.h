@@ -24,12 +24,26 @@ struct ImageFrame {
     ImageWindow display;  ///< the picture that they are part of; empty if the file does not say
 };
 
+/// Types of samples by name: integers of so many bits, which stand for 0 to 1, and floats.
+inline constexpr const char* kSampleTypes[] = {"uint8",  "uint10", "uint12",
+                                               "uint16", "half",   "float"};
+
+/// Which image of a file that holds several.
+struct ImageChoice {
+    int part = -1;      ///< of images behind one another, counted from 0; -1: the first in colour
+    std::string layer;  ///< of channels such as "diffuse.R", "diffuse.G", "diffuse.B": "diffuse";
+                        ///< empty: R, G, B without a name before them, or else the first layer
+};
+
 /// An open image file with at least three channels. Nothing else that it claims has been checked.
 class ImageReader {
 public:
     virtual ~ImageReader() = default;
 
     virtual const ImageFrame& frame() const = 0;
+
+    /// What was taken where it was not clear, such as: holds 3 parts: took part 0 "rgba"; or empty.
+    virtual const std::string& remark() const = 0;
 
     /// Fills the data window: triples red, green, blue, the first line first.
     /// @throws Error  if the pixels cannot be read whole
@@ -55,14 +69,16 @@ public:
     virtual ~ImageCodec() = default;
 
     /// Reads what a file says about itself.
-    /// @throws Error  with path and reason
-    virtual std::unique_ptr<ImageReader> open(const std::string& path) const = 0;
+    /// @throws Error  with path and reason; no such part or layer, and those that there are
+    virtual std::unique_ptr<ImageReader> open(const std::string& path,
+                                              const ImageChoice& choice) const = 0;
 
-    /// Starts a file in the format of its extension: float where the format holds it, otherwise
-    /// 16-bit integers, or the most that the format has.
-    /// @throws Error  with path and reason
-    virtual std::unique_ptr<ImageWriter> create(const std::string& path,
-                                                const ImageFrame& frame) const = 0;
+    /// Starts a file in the format of its extension.
+    /// @param sampleType  one of kSampleTypes; empty: float where the format holds it, otherwise
+    ///                    16-bit integers, or the most that the format has
+    /// @throws Error      with path and reason; a type that the format does not hold
+    virtual std::unique_ptr<ImageWriter> create(const std::string& path, const ImageFrame& frame,
+                                                const std::string& sampleType) const = 0;
 };
 
 /// The codec that goes with the running program. The first call loads it, and it stays loaded.

@@ -12,7 +12,6 @@
 #include <system_error>
 
 #include "host/Error.h"
-#include "host/ImageCodec.h"
 #include "host/ImageLines.h"
 
 namespace host {
@@ -64,18 +63,17 @@ zefra::Box boxOf(const ImageFrame& frame, const std::string& path) {
 
 }  // namespace
 
-ImageFile::ImageFile(std::string path) : path_(std::move(path)) {
+ImageFile::ImageFile(std::string path, const ImageChoice& choice) : path_(std::move(path)) {
     expectReadableFile(path_);
     std::error_code ignored;
     time_ = fs::last_write_time(path_, ignored);
     byteCount_ = fs::file_size(path_, ignored);
 
-    source_ = imageCodec().open(path_);
+    source_ = imageCodec().open(path_, choice);
     expectCredibleSize(source_->frame().data, byteCount_, path_);
     box_ = boxOf(source_->frame(), path_);
+    remark_ = source_->remark();
 }
-
-ImageFile::~ImageFile() = default;
 
 bool ImageFile::isCurrent() const {
     std::error_code failure;

@@ -4,29 +4,30 @@
 #include <memory>
 #include <string>
 
+#include "host/ImageCodec.h"
 #include "zefra/Image.h"
 #include "zefra/Iop.h"
 #include "zefra/Row.h"
 
 namespace host {
 
-class ImageReader;
-
 /// An image file that is read as float red, green and blue.
 ///
 /// Rows     counted upward: row 0 is the last line of the file's display window. Columns are those
 ///          of the file, so a data window that starts elsewhere gives a box that starts elsewhere.
-/// Channels the three that the file names R, G and B, otherwise its first three.
+/// Channels those of the chosen part and layer that the file names R, G and B, otherwise the first
+///          three.
 /// Memory   12 bytes a pixel, from the first row asked for.
 class ImageFile {
 public:
     /// Reads what the file says about itself.
     /// @throws Error  with path and reason
-    explicit ImageFile(std::string path);
-    ~ImageFile();
+    explicit ImageFile(std::string path, const ImageChoice& choice = {});
 
     const std::string& path() const { return path_; }
     const zefra::Box& box() const { return box_; }
+    /// Which image was taken where that was not clear, in words; otherwise empty.
+    const std::string& remark() const { return remark_; }
 
     /// Whether the file still is what was opened.
     bool isCurrent() const;
@@ -42,13 +43,15 @@ private:
     std::filesystem::file_time_type time_;
     std::uintmax_t byteCount_ = 0;
     zefra::Box box_;
+    std::string remark_;
     std::unique_ptr<ImageReader> source_;  // gone once its pixels are here
     std::unique_ptr<float[]> pixels_;      // r g b; the file's first line first
 };
 
-/// Writes an image row by row: float where the format holds it, otherwise 16-bit integers, or the
-/// most that the format has. A file that could not be written whole is removed.
-/// @throws Error  with path and reason; whatever the image throws
-void writeImage(const std::string& path, zefra::Iop& image);
+/// Writes an image row by row. A file that could not be written whole is removed.
+/// @param sampleType  one of kSampleTypes; empty: float where the format holds it, otherwise 16-bit
+///                    integers, or the most that the format has
+/// @throws Error      with path and reason; whatever the image throws
+void writeImage(const std::string& path, zefra::Iop& image, const std::string& sampleType = {});
 
 }  // namespace host

@@ -30,13 +30,13 @@ void interleave(const zefra::Row& row, std::vector<float>& pixels) {
 
 }  // namespace
 
-void writeImage(const std::string& path, zefra::Iop& image) {
+void writeImage(const std::string& path, zefra::Iop& image, const std::string& sampleType) {
     image.validate(true);
     const zefra::Box box = image.box();
     if (box.width() <= 0 || box.height() <= 0) throw Error(path, "there are no pixels to write");
     image.request(box.x, box.y, box.r, box.t, zefra::kRGB, 0);
 
-    const auto file = imageCodec().create(path, frameOf(box));
+    const auto file = imageCodec().create(path, frameOf(box), sampleType);
     zefra::Row row(box.x, box.r);
     std::vector<float> pixels(static_cast<std::size_t>(box.width()) * 3);
     for (int line = 0; line < box.height(); ++line) {

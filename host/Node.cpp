@@ -232,6 +232,14 @@ std::vector<std::string> Node::takeErrors() {
     return std::exchange(errors_, {});
 }
 
+void Node::warning(const char* text) {
+    warnings_.emplace_back(text);
+}
+
+std::vector<std::string> Node::takeWarnings() {
+    return std::exchange(warnings_, {});
+}
+
 void Node::progressMessage(const char* text) {
     if (progress_ != nullptr) progress_->message(text);
 }

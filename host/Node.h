@@ -67,6 +67,8 @@ public:
     /// The failures since the last call, oldest first.
     std::vector<std::string> takeErrors();
     std::size_t errorCount() const { return errors_.size(); }
+    /// What the user should know, likewise.
+    std::vector<std::string> takeWarnings();
 
     /// Where progress is shown; null, as at first, for nowhere.
     void setProgress(ProgressDisplay* display) { progress_ = display; }
@@ -76,6 +78,7 @@ public:
 
     // What the operator asks for.
     void error(const char* text) override;
+    void warning(const char* text) override;
     void progressMessage(const char* text) override;
     void progressFraction(double fraction) override;
     bool aborted() const override;
@@ -97,6 +100,7 @@ private:
     std::vector<std::unique_ptr<PanelControl>> replacedControls_;
     std::vector<Node*> sources_;
     std::vector<std::string> errors_;
+    std::vector<std::string> warnings_;
     ProgressDisplay* progress_ = nullptr;
     int executions_ = 0;
     int changeDepth_ = 0;

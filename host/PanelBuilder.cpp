@@ -22,6 +22,12 @@ zefra::Control* PanelBuilder::fileName(std::string* value, const char* name, con
     return &control;
 }
 
+zefra::Control* PanelBuilder::text(std::string* value, const char* name, const char* label) {
+    PanelControl& control = add(Kind::Text, name, label);
+    if (value != nullptr) control.setText(*value);
+    return &control;
+}
+
 zefra::Control* PanelBuilder::enumeration(int* value, const char* const* items, const char* name,
                                           const char* label) {
     PanelControl& control = add(Kind::Enumeration, name, label);

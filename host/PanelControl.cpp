@@ -72,8 +72,8 @@ PanelControl::PanelControl(Node& node, Kind kind, const char* name, const char* 
     : node_(node), kind_(kind), name_(name), label_(label) {}
 
 bool PanelControl::hasValue() const {
-    return kind_ == Kind::FileName || kind_ == Kind::Enumeration || kind_ == Kind::Integer ||
-           kind_ == Kind::Boolean;
+    return kind_ == Kind::FileName || kind_ == Kind::Text || kind_ == Kind::Enumeration ||
+           kind_ == Kind::Integer || kind_ == Kind::Boolean;
 }
 
 std::string PanelControl::valueText() const {
@@ -94,6 +94,7 @@ std::string PanelControl::valueText() const {
 void PanelControl::parse(const std::string& text, bool mayLeaveMenu) {
     switch (kind_) {
         case Kind::FileName:
+        case Kind::Text:
             text_ = text;
             return;
         case Kind::Enumeration:
@@ -111,7 +112,7 @@ void PanelControl::parse(const std::string& text, bool mayLeaveMenu) {
 }
 
 void PanelControl::setValue(int value) {
-    if (!hasValue() || kind_ == Kind::FileName) return;
+    if (!hasValue() || kind_ == Kind::FileName || kind_ == Kind::Text) return;
     number_ = kind_ == Kind::Boolean ? (value != 0 ? 1 : 0) : value;
     node_.storeValues();
 }

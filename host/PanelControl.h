@@ -12,7 +12,16 @@ class Node;
 /// A control on a node's panel: what the operator declared, and the value that the panel shows.
 class PanelControl final : public zefra::Control {
 public:
-    enum class Kind { FileName, Enumeration, Integer, Boolean, TextLine, ScriptButton, Obsolete };
+    enum class Kind {
+        FileName,
+        Text,
+        Enumeration,
+        Integer,
+        Boolean,
+        TextLine,
+        ScriptButton,
+        Obsolete
+    };
 
     PanelControl(Node& node, Kind kind, const char* name, const char* label);
 
@@ -29,7 +38,7 @@ public:
 
     /// True for the kinds that keep a value in the operator.
     bool hasValue() const;
-    /// The value of a file name; the words of a line of text.
+    /// The value of a file name or a text; the words of a line of text.
     const std::string& text() const { return text_; }
     /// An integer, a menu's index, which may lie beyond its entries, or 1 for true.
     int number() const { return number_; }
@@ -43,8 +52,8 @@ public:
     /// @throws Error  and keeps the value, if the text does not fit the kind
     void parse(const std::string& text, bool mayLeaveMenu);
 
-    /// Sets a number and stores the panel's values in the operator. Nothing for file names and for
-    /// kinds without a value.
+    /// Sets a number and stores the panel's values in the operator. Nothing for file names, texts
+    /// and kinds without a value.
     void setValue(int value) override;
 
     // For the pass that builds the panel.

@@ -17,6 +17,12 @@ zefra::Control* ValueStore::fileName(std::string* value, const char* name, const
     return nullptr;
 }
 
+zefra::Control* ValueStore::text(std::string* value, const char* name, const char*) {
+    const PanelControl* const control = find(name, Kind::Text);
+    if (control != nullptr && value != nullptr) *value = control->text();
+    return nullptr;
+}
+
 zefra::Control* ValueStore::enumeration(int* value, const char* const*, const char* name,
                                         const char*) {
     const PanelControl* const control = find(name, Kind::Enumeration);

@@ -15,6 +15,7 @@ public:
 
     bool buildsPanel() const override { return false; }
     zefra::Control* fileName(std::string* value, const char* name, const char* label) override;
+    zefra::Control* text(std::string* value, const char* name, const char* label) override;
     zefra::Control* enumeration(int* value, const char* const* items, const char* name,
                                 const char* label) override;
     zefra::Control* integer(int* value, const char* name, const char* label) override;

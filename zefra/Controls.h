@@ -33,6 +33,7 @@ public:
     // One control each; `value` is where the operator keeps it, and its default. All return the
     // control while the panel is being built, otherwise null. Names are unique in a node.
     virtual Control* fileName(std::string* value, const char* name, const char* label) = 0;
+    virtual Control* text(std::string* value, const char* name, const char* label) = 0;
     /// @param items  the menu, ended by an empty text; the value is the index
     virtual Control* enumeration(int* value, const char* const* items, const char* name,
                                  const char* label) = 0;

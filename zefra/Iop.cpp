@@ -9,6 +9,7 @@ namespace {
 class NoNode final : public Node {
 public:
     void error(const char*) override {}
+    void warning(const char*) override {}
     void progressMessage(const char*) override {}
     void progressFraction(double) override {}
     bool aborted() const override { return false; }

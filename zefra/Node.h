@@ -12,6 +12,8 @@ public:
 
     /// Reports a failure of this node.
     virtual void error(const char* text) = 0;
+    /// Says what the user should know although nothing has failed.
+    virtual void warning(const char* text) = 0;
 
     // Progress of an execution.
     virtual void progressMessage(const char* text) = 0;

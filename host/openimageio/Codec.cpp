@@ -8,12 +8,13 @@ namespace {
 
 class Codec final : public ImageCodec {
 public:
-    std::unique_ptr<ImageReader> open(const std::string& path) const override {
-        return openImage(path);
+    std::unique_ptr<ImageReader> open(const std::string& path,
+                                      const ImageChoice& choice) const override {
+        return openImage(path, choice);
     }
-    std::unique_ptr<ImageWriter> create(const std::string& path,
-                                        const ImageFrame& frame) const override {
-        return createImage(path, frame);
+    std::unique_ptr<ImageWriter> create(const std::string& path, const ImageFrame& frame,
+                                        const std::string& sampleType) const override {
+        return createImage(path, frame, sampleType);
     }
 };
 

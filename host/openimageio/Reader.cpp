@@ -1,9 +1,7 @@
+#include <OpenImageIO/filesystem.h>
 #include <OpenImageIO/imageio.h>
-#include <OpenImageIO/strutil.h>
-#include <fmt/format.h>
 
 #include <algorithm>
-#include <array>
 #include <fstream>
 #include <iterator>
 #include <string_view>
@@ -11,6 +9,7 @@
 
 #include "host/Error.h"
 #include "host/openimageio/Codec.h"
+#include "host/openimageio/Parts.h"
 
 namespace host::openimageio {
 namespace {
@@ -19,37 +18,9 @@ namespace {
     fail(path, reason, "is damaged or cut off");
 }
 
-void expectPlainImage(const OIIO::ImageSpec& spec, const std::string& path) {
-    if (spec.nchannels < 3) {
-        throw Error(path, fmt::format("needs red, green and blue channels, has {}",
-                                      std::max(spec.nchannels, 0)));
-    }
-    if (spec.deep || spec.depth > 1) throw Error(path, "is not a flat image");
-}
-
 ImageFrame frameOf(const OIIO::ImageSpec& spec) {
     return {{spec.x, spec.y, spec.width, spec.height},
             {spec.full_x, spec.full_y, spec.full_width, spec.full_height}};
-}
-
-/// The index of a channel that is called by its letter or its word, or -1.
-int findChannel(const OIIO::ImageSpec& spec, const char* letter, const char* word) {
-    for (std::size_t i = 0; i < spec.channelnames.size(); ++i) {
-        const std::string& name = spec.channelnames[i];
-        if (OIIO::Strutil::iequals(name, letter) || OIIO::Strutil::iequals(name, word)) {
-            return static_cast<int>(i);
-        }
-    }
-    return -1;
-}
-
-/// Where red, green and blue are among the file's channels.
-std::array<int, 3> findChannels(const OIIO::ImageSpec& spec) {
-    const std::array<int, 3> named = {findChannel(spec, "r", "red"),
-                                      findChannel(spec, "g", "green"),
-                                      findChannel(spec, "b", "blue")};
-    const bool areNamed = named[0] >= 0 && named[1] >= 0 && named[2] >= 0;
-    return areNamed ? named : std::array<int, 3>{0, 1, 2};
 }
 
 /// JPEG alone is decoded to a picture of any length: what is missing comes out grey. A whole file
@@ -62,23 +33,43 @@ void expectWholeJPEG(const std::string& path) {
     if (tail.find("\xff\xd9") == std::string::npos) throw Error(path, "is cut off");
 }
 
+/// A file that remembers whether it ended before a read did. DPX needs it: lines of 10 and 12 bits
+/// that are not there are taken to be black. Nothing is read ahead there, so that only what is
+/// missing counts.
+class WatchedFile final : public OIIO::Filesystem::IOFile {
+public:
+    explicit WatchedFile(const std::string& path) : IOFile(path, Read) {}
+
+    const char* proxytype() const override { return "watched file"; }
+    std::size_t read(void* buffer, std::size_t size) override {
+        const std::size_t count = IOFile::read(buffer, size);
+        wasShort_ = wasShort_ || count < size;
+        return count;
+    }
+    bool wasShort() const { return wasShort_; }
+
+private:
+    bool wasShort_ = false;
+};
+
 class Reader final : public ImageReader {
 public:
-    explicit Reader(const std::string& path) : path_(path) {
+    Reader(const std::string& path, const ImageChoice& choice) : path_(path) {
         OIIO::ImageSpec wishes;
         wishes["oiio:UnassociatedAlpha"] = 1;  // colours as the file has them
         input_ = OIIO::ImageInput::open(path_, &wishes);
         if (!input_) failReading(path_, OIIO::geterror());
-        expectPlainImage(input_->spec(), path_);
-        frame_ = frameOf(input_->spec());
-        channels_ = findChannels(input_->spec());
+        if (formatName() == "dpx") reopenWatched(wishes);
+        chosen_ = chooseImage(*input_, choice, path_);
+        frame_ = frameOf(chosen_.spec);
     }
 
     const ImageFrame& frame() const override { return frame_; }
+    const std::string& remark() const override { return chosen_.remark; }
 
     void readPixels(float* rgb) override {
-        if (std::string_view(input_->format_name()) == "jpeg") expectWholeJPEG(path_);
-        const auto [red, green, blue] = channels_;
+        if (formatName() == "jpeg") expectWholeJPEG(path_);
+        const auto [red, green, blue] = chosen_.channels;
         if (green == red + 1 && blue == red + 2) {
             readChannels(red, 3, rgb);
         } else {
@@ -86,27 +77,41 @@ public:
             readChannels(green, 1, rgb + 1);
             readChannels(blue, 1, rgb + 2);
         }
+        if (file_ && file_->wasShort()) throw Error(path_, "is cut off");
     }
 
 private:
+    std::string_view formatName() const { return input_->format_name(); }
+
+    void reopenWatched(const OIIO::ImageSpec& wishes) {
+        input_->close();
+        file_ = std::make_unique<WatchedFile>(path_);
+        OIIO::ImageSpec ignored;
+        if (!input_->set_ioproxy(file_.get()) || !input_->open(path_, ignored, wishes)) {
+            failReading(path_, input_->geterror());
+        }
+    }
+
     void readChannels(int first, int count, float* target) {
         constexpr OIIO::stride_t kPixelBytes = 3 * sizeof(float);
-        if (!input_->read_image(0, 0, first, first + count, OIIO::TypeFloat, target, kPixelBytes) ||
+        if (!input_->read_image(chosen_.part, 0, first, first + count, OIIO::TypeFloat, target,
+                                kPixelBytes) ||
             input_->has_error()) {  // TIFF: strips that are not there, and still a good result
             failReading(path_, input_->geterror());
         }
     }
 
     const std::string path_;
+    std::unique_ptr<WatchedFile> file_;  // where the library has to be watched
     std::unique_ptr<OIIO::ImageInput> input_;
+    ChosenImage chosen_;
     ImageFrame frame_;
-    std::array<int, 3> channels_{};
 };
 
 }  // namespace
 
-std::unique_ptr<ImageReader> openImage(const std::string& path) {
-    return std::make_unique<Reader>(path);
+std::unique_ptr<ImageReader> openImage(const std::string& path, const ImageChoice& choice) {
+    return std::make_unique<Reader>(path, choice);
 }
 
 }  // namespace host::openimageio

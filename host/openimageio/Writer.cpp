@@ -2,12 +2,15 @@
 #include <OpenImageIO/imageio.h>
 
 #include <cerrno>
+#include <cmath>
 #include <cstdio>
 #include <filesystem>
 #include <system_error>
+#include <vector>
 
 #include "host/Error.h"
 #include "host/openimageio/Codec.h"
+#include "host/openimageio/SampleType.h"
 
 namespace host::openimageio {
 namespace {
@@ -77,7 +80,8 @@ private:
     bool isFinished_ = false;
 };
 
-OIIO::ImageSpec specOf(const ImageFrame& frame, const std::string& formatName) {
+OIIO::ImageSpec specOf(const ImageFrame& frame, const std::string& formatName,
+                       const std::string& sampleType) {
     const bool holdsFloat = formatName == "openexr" || formatName == "tiff";
     OIIO::ImageSpec spec(frame.data.width, frame.data.height, 3,
                          holdsFloat ? OIIO::TypeFloat : OIIO::TypeUInt16);
@@ -87,24 +91,37 @@ OIIO::ImageSpec specOf(const ImageFrame& frame, const std::string& formatName) {
     spec.full_y = frame.display.y;
     spec.full_width = frame.display.width;
     spec.full_height = frame.display.height;
+    setSampleType(spec, sampleType);
     return spec;
 }
 
 class Writer final : public ImageWriter {
 public:
-    Writer(const std::string& path, const ImageFrame& frame)
-        : path_(path), line_(frame.data.y), file_(path) {
+    Writer(const std::string& path, const ImageFrame& frame, const std::string& sampleType)
+        : path_(path),
+          line_(frame.data.y),
+          sampleCount_(std::size_t{3} * static_cast<std::size_t>(frame.data.width)),
+          codeMax_(static_cast<float>(codeMaxOf(sampleType))),
+          file_(path) {
         format_ = OIIO::ImageOutput::create(path_);
         if (!format_) failWriting(path_, OIIO::geterror());
+        if (!sampleType.empty()) expectFormatHolds(path_, sampleType);
         if (format_->supports("ioproxy")) format_->set_ioproxy(file_.open());
-        if (!format_->open(path_, specOf(frame, format_->format_name()))) {
+        if (!format_->open(path_, specOf(frame, format_->format_name(), sampleType))) {
             failWriting(path_, format_->geterror());
         }
         file_.started();
     }
 
     void writeLine(const float* rgb) override {
-        if (!format_->write_scanline(line_++, 0, OIIO::TypeFloat, rgb)) {
+        const float* samples = rgb;
+        if (codeMax_ > 0.0F) {
+            codes_.assign(rgb, rgb + sampleCount_);
+            for (float& each : codes_)
+                each = std::round(each * codeMax_) / codeMax_;
+            samples = codes_.data();
+        }
+        if (!format_->write_scanline(line_++, 0, OIIO::TypeFloat, samples)) {
             failWriting(path_, format_->geterror());
         }
     }
@@ -116,15 +133,19 @@ public:
 
 private:
     const std::string path_;
-    int line_;  // the next one
+    int line_;                 // the next one
+    std::size_t sampleCount_;  // in a line
+    float codeMax_;            // of a type that the library would not round to
+    std::vector<float> codes_;
     OutputFile file_;
     std::unique_ptr<OIIO::ImageOutput> format_;  // uses the file to its own end
 };
 
 }  // namespace
 
-std::unique_ptr<ImageWriter> createImage(const std::string& path, const ImageFrame& frame) {
-    return std::make_unique<Writer>(path, frame);
+std::unique_ptr<ImageWriter> createImage(const std::string& path, const ImageFrame& frame,
+                                         const std::string& sampleType) {
+    return std::make_unique<Writer>(path, frame, sampleType);
 }
 
 }  // namespace host::openimageio

@@ -7,6 +7,7 @@
 #include "host/ProgressDisplay.h"
 #include "orlith/Command.h"
 #include "orlith/Generated.h"
+#include "orlith/ImageOptions.h"
 #include "orlith/Knobs.h"
 #include "orlith/Options.h"
 #include "orlith/OutputFile.h"
@@ -19,6 +20,7 @@ namespace {
 
 struct GenerateOptions {
     std::string image;
+    host::ImageChoice choice;
     std::string output;
     Knobs controls;  // of the options, in the order in which they are set
     Knobs knobs;
@@ -114,14 +116,12 @@ void execute(host::Node& node, const OutputFile& output) {
 int runGenerate(const GenerateOptions& options) {
     host::Host host;
     host.loadBundles();
-    host::Node& read = host.createNode("Read");
+    host::Node& read = createRead(host, options.image, options.choice);
     host::Node& generate = host.createNode("GenerateLUT");
     generate.connect(0, read);
-    read.setValue("file", options.image);
     setControls(generate, options);
 
-    zefra::Iop& image = *read.image();
-    image.validate(true);
+    zefra::Iop& image = openImage(read);
     checkPattern(options.image, image);
 
     OutputFile output(generate.value("file"));
@@ -174,6 +174,7 @@ void addGenerate(CLI::App& program, int& status) {
         }
     }
     addKnobOption(*command, options->knobs);
+    addImageChoice(*command, options->choice);
     command->add_flag("--no-verify", options->skipsVerification,
                       "Do not read the written file back to compare it");
     command->add_flag("--quiet", options->isQuiet, "Do not say what was written");

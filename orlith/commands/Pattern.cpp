@@ -4,6 +4,7 @@
 #include "host/Host.h"
 #include "host/ImageFile.h"
 #include "orlith/Command.h"
+#include "orlith/ImageOptions.h"
 #include "orlith/Messages.h"
 #include "orlith/Options.h"
 #include "orlith/OutputFile.h"
@@ -18,6 +19,7 @@ constexpr int kLargest = 129;
 struct PatternOptions {
     std::string path;
     int size = 33;
+    std::string sampleType;
     bool isQuiet = false;
 };
 
@@ -30,7 +32,7 @@ int runPattern(const PatternOptions& options) {
     node.setValue("size", std::to_string(options.size));
     OutputFile output(options.path);
     try {
-        host::writeImage(output.stagedPath(), *node.image());
+        host::writeImage(output.stagedPath(), *node.image(), options.sampleType);
     } catch (const host::Error& error) {
         throw Failure(output.inWords(error.what()));
     }
@@ -54,6 +56,7 @@ void addPattern(CLI::App& program, int& status) {
         ->required();
     addInteger(*command, "--size", kSmallest, kLargest, "Points on each side of the cube (33)",
                [options](int size) { options->size = size; });
+    addSampleType(*command, options->sampleType);
     command->add_flag("--quiet", options->isQuiet, "Do not say what was written");
     command->callback([options, &status] { status = runPattern(*options); });
 }

@@ -5,7 +5,6 @@
 
 #include <cstdint>
 #include <filesystem>
-#include <ostream>
 #include <string>
 #include <vector>
 
@@ -15,40 +14,45 @@ namespace {
 
 using test::failureOf;
 
-/// The value that tells a sample's place in the file: column, line counted downward, channel.
-float mark(int column, int line, int channel) {
-    return static_cast<float>(column + 10 * line + 100 * channel);
+/// The value that tells a sample's place in the file: column, line counted downward, channel, part.
+float mark(int column, int line, int channel, std::size_t part = 0) {
+    return static_cast<float>(column + 10 * line + 100 * channel + 1000 * static_cast<int>(part));
 }
 
 OIIO::ImageSpec markedSpec(const std::vector<std::string>& channels) {
     OIIO::ImageSpec spec(4, 3, static_cast<int>(channels.size()), OIIO::TypeFloat);
     spec.channelnames = channels;
+    spec["oiio:subimagename"] = "with " + channels[0];
     return spec;
 }
 
-/// Writes an image whose samples tell their places.
-void writeMarked(const std::string& path, const OIIO::ImageSpec& spec) {
-    std::vector<float> samples;
-    for (int line = 0; line < spec.height; ++line) {
-        for (int column = 0; column < spec.width; ++column) {
-            for (int channel = 0; channel < spec.nchannels; ++channel)
-                samples.push_back(mark(column, line, channel));
-        }
-    }
+/// Writes an image, of one or several parts, whose samples tell their places.
+void writeMarked(const std::string& path, const std::vector<OIIO::ImageSpec>& parts) {
     const auto output = OIIO::ImageOutput::create(path);
-    ASSERT_TRUE(output && output->open(path, spec) &&
-                output->write_image(OIIO::TypeFloat, samples.data()) && output->close())
-        << path;
+    bool isGood = output->open(path, static_cast<int>(parts.size()), parts.data());
+    for (std::size_t part = 0; part < parts.size(); ++part) {
+        const OIIO::ImageSpec& spec = parts[part];
+        std::vector<float> samples;
+        for (int pixel = 0; pixel < spec.width * spec.height; ++pixel) {
+            for (int channel = 0; channel < spec.nchannels; ++channel)
+                samples.push_back(mark(pixel % spec.width, pixel / spec.width, channel, part));
+        }
+        isGood = isGood &&
+                 (part == 0 || output->open(path, spec, OIIO::ImageOutput::AppendSubimage)) &&
+                 output->write_image(OIIO::TypeFloat, samples.data());
+    }
+    ASSERT_TRUE(isGood && output->close()) << path;
 }
 
 /// Expects row y of a file, from column x on, to hold one line of the marked image.
-void expectLine(host::ImageFile& image, int y, int x, int line, int red, int green, int blue) {
+void expectLine(host::ImageFile& image, int y, int x, int line, int red, int green, int blue,
+                std::size_t part = 0) {
     zefra::Row row(x, x + 4);
     image.copyRow(y, x, x + 4, zefra::kRGB, row);
     for (int column = 0; column < 4; ++column) {
-        EXPECT_EQ(row.pixels(zefra::kRed)[column], mark(column, line, red));
-        EXPECT_EQ(row.pixels(zefra::kGreen)[column], mark(column, line, green));
-        EXPECT_EQ(row.pixels(zefra::kBlue)[column], mark(column, line, blue));
+        EXPECT_EQ(row.pixels(zefra::kRed)[column], mark(column, line, red, part));
+        EXPECT_EQ(row.pixels(zefra::kGreen)[column], mark(column, line, green, part));
+        EXPECT_EQ(row.pixels(zefra::kBlue)[column], mark(column, line, blue, part));
     }
 }
 
@@ -63,7 +67,7 @@ using ImageFileTest = test::HostTest;
 
 TEST_F(ImageFileTest, CountsRowsUpwardFromTheLastLine) {
     const std::string path = folder_.path("marked.exr");
-    writeMarked(path, markedSpec({"R", "G", "B"}));
+    writeMarked(path, {markedSpec({"R", "G", "B"})});
     host::ImageFile image(path);
     EXPECT_EQ(image.box().width(), 4);
     EXPECT_EQ(image.box().height(), 3);
@@ -71,21 +75,61 @@ TEST_F(ImageFileTest, CountsRowsUpwardFromTheLastLine) {
         expectLine(image, y, 0, 2 - y, 0, 1, 2);
 }
 
-TEST_F(ImageFileTest, TakesChannelsByNameOrElseTheFirstThree) {
+TEST_F(ImageFileTest, TakesTheImageThatIsChosenOrMeant) {
+    using Parts = std::vector<std::vector<std::string>>;
+    const Parts stereo = {{"Z"}, {"R", "G", "B"}, {"A", "R", "G", "B"}};
+    const Parts layers = {{"a.R", "a.G", "a.B", "b.red", "b.Green", "b.BLUE", "b.Z"}};
     const struct {
-        std::vector<std::string> names;
+        Parts parts;
+        host::ImageChoice choice;
+        std::size_t part;
         int red, green, blue;
+        const char* words;  // the remark, or what is wrong
     } kCases[] = {
-        {{"B", "G", "R"}, 2, 1, 0},          {{"alpha", "red", "Green", "BLUE"}, 1, 2, 3},
-        {{"g", "depth", "r", "b"}, 2, 0, 3}, {{"R", "G", "Y", "B"}, 0, 1, 3},
-        {{"u", "v", "w"}, 0, 1, 2},
+        {{{"B", "G", "R"}}, {}, 0, 2, 1, 0, ""},
+        {{{"alpha", "red", "Green", "BLUE"}}, {}, 0, 1, 2, 3, ""},
+        {{{"R", "G", "Y", "B"}}, {}, 0, 0, 1, 3, ""},
+        {{{"u", "v", "w"}}, {}, 0, 0, 1, 2, ""},
+        {{{"t", "u", "v", "w", "x"}},
+         {},
+         0,
+         0,
+         1,
+         2,
+         "names none of 5 channels red, green and blue: took the first"},
+        {{{"Z"}, {"u", "v", "w"}, {"R", "G", "B"}}, {}, 2, 0, 1, 2, ""},
+        {stereo, {}, 1, 0, 1, 2, "holds 3 parts: took part 1 \"with R\""},
+        {stereo, {2, ""}, 2, 1, 2, 3, ""},
+        {stereo, {0, ""}, 0, 0, 0, 0, "needs red, green and blue channels, has 1"},
+        {stereo,
+         {3, ""},
+         0,
+         0,
+         0,
+         0,
+         "has no part 3; it has 0 \"with Z\", 1 \"with R\", 2 \"with A\""},
+        {stereo, {-1, "R"}, 0, 0, 0, 0, "has no layer \"R\"; it has none"},
+        {{{"l.R", "l.G", "l.B"}}, {}, 0, 0, 1, 2, ""},
+        {{{"R", "G", "B", "a.R", "a.G", "a.B"}}, {}, 0, 0, 1, 2, ""},
+        {layers, {}, 0, 0, 1, 2, "holds 2 layers: took \"a\""},
+        {layers, {-1, "b"}, 0, 3, 4, 5, ""},
+        {layers, {0, "c"}, 0, 0, 0, 0, "has no layer \"c\"; it has \"a\", \"b\""},
     };
     for (const auto& each : kCases) {
-        SCOPED_TRACE(each.names[0]);
-        const std::string path = folder_.path("channels.exr");
-        writeMarked(path, markedSpec(each.names));
-        host::ImageFile image(path);
-        expectLine(image, 1, 0, 1, each.red, each.green, each.blue);
+        SCOPED_TRACE(each.parts[0][0] + " " + each.words);
+        const std::string path = folder_.path("parts.exr");
+        std::vector<OIIO::ImageSpec> specs;
+        for (const auto& channels : each.parts)
+            specs.push_back(markedSpec(channels));
+        writeMarked(path, specs);
+        std::string words;
+        words = failureOf([&] {
+                    host::ImageFile image(path, each.choice);
+                    expectLine(image, 1, 0, 1, each.red, each.green, each.blue, each.part);
+                    words = path + ": " + image.remark();
+                }) +
+                words;
+        EXPECT_EQ(words, path + ": " + each.words);
     }
 }
 
@@ -96,7 +140,7 @@ TEST_F(ImageFileTest, KeepsTheDataWindowWhereTheFileHasIt) {
     spec.y = 2;
     spec.full_width = 20;
     spec.full_height = 10;
-    writeMarked(path, spec);
+    writeMarked(path, {spec});
 
     host::ImageFile image(path);
     EXPECT_EQ(image.box().x, 5);
@@ -119,9 +163,9 @@ TEST_F(ImageFileTest, KeepsTheDataWindowWhereTheFileHasIt) {
 
 TEST_F(ImageFileTest, SaysWhatIsWrongWithAFile) {
     const std::string one = folder_.path("one.exr");
-    writeMarked(one, markedSpec({"Y"}));
+    writeMarked(one, {markedSpec({"Y"})});
     const std::string two = folder_.path("two.exr");
-    writeMarked(two, markedSpec({"R", "G"}));
+    writeMarked(two, {markedSpec({"R", "G"})});
     const std::string text = folder_.write("text.exr", "not an image\n");
     const std::string empty = folder_.write("empty.png", "");
     // 53 bytes that claim 4,800,000,000 bytes of float pixels.
@@ -142,68 +186,66 @@ TEST_F(ImageFileTest, SaysWhatIsWrongWithAFile) {
         EXPECT_EQ(failureOf([&] { readRow(each.path); }), each.path + each.reason);
 }
 
-struct Format {
-    const char* extension;
-    float tolerance;  // for values from 0 to 1
-
-    friend std::ostream& operator<<(std::ostream& out, const Format& format) {
-        return out << format.extension;
-    }
-};
-class ImageFormatTest : public ImageFileTest, public ::testing::WithParamInterface<Format> {};
-
-TEST_P(ImageFormatTest, HoldsThePatternAndIsRefusedWhenCutOff) {
-    const std::string path = folder_.path(std::string("pattern.") + GetParam().extension);
+TEST_F(ImageFileTest, FormatsHoldThePatternAndAreRefusedWhenCutOff) {
+    constexpr float kHalfCode = 0.501F;
+    const struct {
+        const char *name, *sampleType;
+        OIIO::TypeDesc type;
+        int bits;
+        float tolerance;  // for values from 0 to 1
+    } kCases[] = {
+        {"f.exr", "", OIIO::TypeFloat, 32, 0.0F},
+        {"h.exr", "half", OIIO::TypeHalf, 16, 0x1p-12F},
+        {"f.tif", "", OIIO::TypeFloat, 32, 0.0F},
+        {"10.tif", "uint10", OIIO::TypeUInt16, 10, kHalfCode / 1023},
+        {"f.png", "", OIIO::TypeUInt16, 16, kHalfCode / 65535},
+        {"8.png", "uint8", OIIO::TypeUInt8, 8, kHalfCode / 255},
+        {"f.dpx", "", OIIO::TypeUInt16, 16, kHalfCode / 65535},
+        {"10.dpx", "uint10", OIIO::TypeUInt16, 10, kHalfCode / 1023},
+        {"12.dpx", "uint12", OIIO::TypeUInt16, 12, kHalfCode / 4095},
+        {"f.ppm", "", OIIO::TypeUInt8, 8, kHalfCode / 255},
+        {"f.tga", "", OIIO::TypeUInt8, 8, kHalfCode / 255},
+        {"f.hdr", "", OIIO::TypeFloat, 32, 1.0F / 128},  // shared exponent
+        {"f.jpg", "", OIIO::TypeUInt8, 8, 0.05F},
+    };
     host::Node& pattern = host_.createNode("CMSTestPattern");
-    pattern.setValue("size", "5");
-    host::writeImage(path, *pattern.image());
+    pattern.setValue("size", "6");
+    for (const auto& each : kCases) {
+        SCOPED_TRACE(each.name);
+        const std::string path = folder_.path(each.name);
+        host::writeImage(path, *pattern.image(), each.sampleType);
+        const OIIO::ImageSpec spec = OIIO::ImageInput::open(path)->spec();
+        EXPECT_EQ(spec.format, each.type);
+        EXPECT_EQ(spec.get_int_attribute("oiio:BitsPerSample", each.bits), each.bits);
 
-    host::ImageFile image(path);
-    const zefra::Box& box = image.box();
-    ASSERT_EQ(box.width(), pattern.image()->box().width());
-    ASSERT_EQ(box.height(), pattern.image()->box().height());
-    for (int y = 3; y < box.t; y += 7) {
-        zefra::Row expected(0, box.r);
-        zefra::Row found(0, box.r);
-        expected.get(*pattern.image(), y, 0, box.r, zefra::kRGB);
-        image.copyRow(y, 0, box.r, zefra::kRGB, found);
-        for (int x = 3; x < box.r; x += 7) {
-            for (const zefra::Channel channel : {zefra::kRed, zefra::kGreen, zefra::kBlue})
-                ASSERT_NEAR(found.pixels(channel)[x], expected.pixels(channel)[x],
-                            GetParam().tolerance);
+        host::ImageFile image(path);
+        const zefra::Box& box = image.box();
+        ASSERT_EQ(box.width(), pattern.image()->box().width());
+        ASSERT_EQ(box.height(), pattern.image()->box().height());
+        for (int y = 3; y < box.t; y += 7) {
+            zefra::Row expected(0, box.r);
+            zefra::Row found(0, box.r);
+            expected.get(*pattern.image(), y, 0, box.r, zefra::kRGB);
+            image.copyRow(y, 0, box.r, zefra::kRGB, found);
+            for (int x = 3; x < box.r; x += 7) {
+                for (const zefra::Channel channel : {zefra::kRed, zefra::kGreen, zefra::kBlue})
+                    ASSERT_NEAR(found.pixels(channel)[x], expected.pixels(channel)[x],
+                                each.tolerance);
+            }
+        }
+
+        const auto byteCount = std::filesystem::file_size(path);
+        for (const std::uintmax_t kept : {byteCount * 9 / 10, byteCount / 2, byteCount / 10}) {
+            std::filesystem::resize_file(path, kept);
+            const std::string failure = failureOf([&] { readRow(path); });
+            EXPECT_EQ(failure.find(path + ": "), 0U) << kept << " bytes: " << failure;
+            EXPECT_EQ(failure.find('\n'), std::string::npos);
         }
     }
-
-    const auto byteCount = std::filesystem::file_size(path);
-    for (const std::uintmax_t kept : {byteCount * 9 / 10, byteCount / 2, byteCount / 10}) {
-        std::filesystem::resize_file(path, kept);
-        const std::string failure = failureOf([&] { readRow(path); });
-        EXPECT_EQ(failure.find(path + ": "), 0U) << kept << " bytes: " << failure;
-        EXPECT_EQ(failure.find('\n'), std::string::npos);
-    }
-}
-
-INSTANTIATE_TEST_SUITE_P(Formats, ImageFormatTest,
-                         ::testing::Values(Format{"exr", 0.0F}, Format{"tif", 0.0F},
-                                           Format{"png", 0.5F / 65535.0F},
-                                           Format{"dpx", 0.5F / 65535.0F},
-                                           Format{"ppm", 0.51F / 255.0F},
-                                           Format{"hdr", 1.0F / 128.0F},  // shared exponent
-                                           Format{"jpg", 0.05F}),
-                         [](const auto& each) { return std::string(each.param.extension); });
-
-TEST_F(ImageFileTest, WritesFloatIntoTheFormatsThatHoldIt) {
-    host::Node& pattern = host_.createNode("CMSTestPattern");
-    pattern.setValue("size", "4");
-    for (const char* const name : {"float.exr", "float.tif"}) {
-        host::writeImage(folder_.path(name), *pattern.image());
-        host::ImageFile image(folder_.path(name));
-        zefra::Row row(0, 14);
-        image.copyRow(0, 0, 14, zefra::kRGB, row);
-        EXPECT_EQ(row.pixels(zefra::kRed)[7], 1.0F / 3.0F) << name;
-    }
-    const auto input = OIIO::ImageInput::open(folder_.path("float.tif"));
-    EXPECT_EQ(input->spec().format, OIIO::TypeFloat);
+    const std::string path = folder_.path("other.png");
+    EXPECT_EQ(failureOf([&] { host::writeImage(path, *pattern.image(), "half"); }),
+              path + ": .png files hold uint8, uint16, not half");
+    EXPECT_FALSE(std::filesystem::exists(path));
 }
 
 /// An image that fails in the middle.
