@@ -31,4 +31,12 @@ RGB CubicInterpolate(const LUT& lut, const RGB& point);
 /// @throws Exception "Extrapolate: expecting a 3D lut"
 RGB Extrapolate(const LUT& lut, int r, int g, int b);
 
+/// One of the methods above, or one of the same form.
+using InterpolationMethod = RGB (*)(const LUT& lut, const RGB& point);
+
+/// A lattice's output at a point behind the pre-LUT: by the method within the domain; outside, from
+/// the nearest point of the domain on in a straight line, whose slope is measured over a step of
+/// 1 / width back into the domain.
+RGB interpolateOrContinue(const LUT& lut, const RGB& point, InterpolationMethod method);
+
 }  // namespace Orlith::LUT

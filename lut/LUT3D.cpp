@@ -1,6 +1,5 @@
 #include "lut/LUT3D.h"
 
-#include <algorithm>
 #include <cstdint>
 #include <limits>
 #include <stdexcept>
@@ -46,45 +45,14 @@ const RGB& LUT3D::get(int r, int g, int b) const {
 }
 
 RGB LUT3D::interpolate(const RGB& point, InterpolationMode mode, bool extrapolate) const {
-    using Method = RGB (*)(const LUT&, const RGB&);
     // In the order of InterpolationMode.
-    static constexpr Method kMethods[] = {StepInterpolate, LinearStaggeredInterpolate,
-                                          TrilinearInterpolate, CubicInterpolate};
+    static constexpr InterpolationMethod kMethods[] = {StepInterpolate, LinearStaggeredInterpolate,
+                                                       TrilinearInterpolate, CubicInterpolate};
     if (mode > Cubic) throw Exception("Unknown interpolation mode");
-    const Method method = kMethods[mode];
     if (values.empty()) return RGB(0.0F, 0.0F, 0.0F);
-
-    RGB min;
-    RGB max;
-    minmax(min, max);
-    const RGB q = applyShaper(point);
-    if (!extrapolate) return method(*this, q);
-    const auto inside = [&](unsigned c) { return min[c] <= q[c] && q[c] <= max[c]; };
-    if (inside(0) && inside(1) && inside(2)) return method(*this, q);
-
-    // The nearest point of the domain, and the way from there to the colour.
-    const int sizes[] = {width_, height_, depth_};
-    RGB nearest;
-    for (unsigned c = 0; c < 3; ++c) {
-        const float scale = transform[c][c];
-        const float offset = transform[3][c];
-        const auto last = static_cast<float>(sizes[c] - 1);
-        const float index = std::max(0.0F, std::min((q[c] - offset) / scale, last));
-        nearest[c] = index * scale + offset;
-    }
-    RGB direction = q - nearest;
-    const float distance = direction.two_norm();
-    direction.normalize();
-
-    // Slope by a backward difference of one red cell, the same step on every axis.
-    const float step = 1.0F / static_cast<float>(width_);
-    const RGB edge = method(*this, nearest);
-    const RGB inner = method(*this, nearest - direction * step);
-    RGB result;
-    for (unsigned c = 0; c < 3; ++c) {
-        result[c] = edge[c] + ((edge[c] - inner[c]) / step) * distance;
-    }
-    return result;
+    const RGB position = applyShaper(point);
+    return extrapolate ? interpolateOrContinue(*this, position, kMethods[mode])
+                       : kMethods[mode](*this, position);
 }
 
 void LUT3D::minmax(RGB& min, RGB& max) const {
