@@ -23,6 +23,10 @@ install(FILES
     cmake/FindVNL.cmake
     DESTINATION ${ORLITH_CONFIG_DIR})
 
+# Finds the prefix from its own place: `cmake --install --prefix` may choose another.
+file(RELATIVE_PATH ORLITH_PC_TO_PREFIX
+    ${CMAKE_INSTALL_FULL_LIBDIR}/pkgconfig ${CMAKE_INSTALL_PREFIX})
+string(REGEX REPLACE "/$" "" ORLITH_PC_TO_PREFIX ${ORLITH_PC_TO_PREFIX})
 configure_file(cmake/orlith.pc.in orlith.pc @ONLY)
 install(FILES ${PROJECT_BINARY_DIR}/orlith.pc DESTINATION ${CMAKE_INSTALL_LIBDIR}/pkgconfig)
 install(FILES LICENSE DESTINATION ${CMAKE_INSTALL_DATADIR}/doc/orlith)

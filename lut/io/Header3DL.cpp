@@ -3,8 +3,6 @@
 #include "lut/io/Header3DL.h"
 
 #include <algorithm>
-#include <boost/tokenizer.hpp>
-#include <string>
 
 #include "lut/Exception.h"
 #include "lut/io/Warning.h"
@@ -93,9 +91,11 @@ void Header3DL::takeGenerator(std::string_view text) {
 
 /// "17x17x17". Empty parts do not count, as with the words of a line.
 void Header3DL::takeDimensions(std::string_view text) {
-    using Parts = boost::tokenizer<boost::char_separator<char>, std::string_view::const_iterator>;
     int partCount = 0;
-    for (const std::string& part : Parts(text, boost::char_separator<char>("x"))) {
+    while (!text.empty()) {
+        const std::string_view part = text.substr(0, text.find('x'));
+        text.remove_prefix(std::min(part.size() + 1, text.size()));
+        if (part.empty()) continue;
         if (partCount == 3) {
             warn("Warning: 3DL file reader: invalid dimensions");
             return;

@@ -23,7 +23,6 @@
 #include <boost/smart_ptr/make_shared.hpp>
 #include <cmath>
 #include <fstream>
-#include <vector>
 
 #include "lut/Exception.h"
 #include "lut/FloatToInt.h"
@@ -108,44 +107,61 @@ int inputBitsOf(float min, float max) {
     return bitCountOf(codeMax);
 }
 
-/// Deliberate: only a step that grows is refused, one that shrinks passes however much. Held by
-/// ThreeDLReader.RefusesAGridWhoseStepsGrowOnly.
-void expectLinear(const std::vector<float>& values, float tolerance) {
-    for (std::size_t i = 2; i < values.size(); ++i) {
-        const float step = values[i - 1] - values[i - 2];
-        const float nextStep = values[i] - values[i - 1];
-        if (!(nextStep - step <= tolerance)) {
-            throw Exception("3DL file reader: LUT input values must be linear");
-        }
+/// What the numbers of a grid come to.
+struct GridNumbers {
+    int count;
+    float min;
+    float max;
+    bool isLinear;
+};
+
+/// Walks the grid's line, which may hold millions of numbers, and keeps none of them.
+/// @param line       not empty
+/// @param tolerance  by how much a step may exceed the one before. Deliberate: one that shrinks
+///                   passes however much. Held by ThreeDLReader.RefusesAGridWhoseStepsGrowOnly.
+GridNumbers walkGrid(std::string_view line, float tolerance) {
+    std::string_view word;
+    takeWord(line, word);
+    float last = toFloat(word);
+    GridNumbers grid{1, last, last, true};
+    float lastStep = 0.0F;
+    while (takeWord(line, word)) {
+        const float value = toFloat(word);
+        const float step = value - last;
+        if (grid.count > 1 && !(step - lastStep <= tolerance)) grid.isLinear = false;
+        if (value < grid.min) grid.min = value;
+        if (!(value < grid.max)) grid.max = value;
+        ++grid.count;
+        last = value;
+        lastStep = step;
     }
+    return grid;
 }
 
 Grid parseGrid(std::string_view line, const Header3DL& header) {
-    const Tokens words(line);
-    std::vector<float> values(words.count());
-    for (std::size_t i = 0; i < values.size(); ++i)
-        values[i] = toFloat(words[i]);
-    const auto [min, max] = std::minmax_element(values.begin(), values.end());
+    // The first number tells codes from numbers with a point.
+    const std::string_view first = Tokens(line)[0];
+    const std::size_t point = first.find('.');
+    const bool isCodes = point == std::string_view::npos;
+    const auto digits = static_cast<double>(isCodes ? 0 : first.size() - point - 1);
+    const auto tolerance = static_cast<float>(isCodes ? 1.0 : 5.0 * std::pow(0.1, digits));
+    const auto [count, min, max, isLinear] = walkGrid(line, tolerance);
 
-    Grid grid{static_cast<int>(values.size()), 0.0F, 1.0F, header.inputBits()};
-    float tolerance = 1.0F;
-    const std::size_t point = words[0].find('.');
-    if (point == std::string_view::npos) {
-        grid.inputBits = inputBitsOf(*min, *max);
+    Grid grid{count, 0.0F, 1.0F, header.inputBits()};
+    if (isCodes) {
+        grid.inputBits = inputBitsOf(min, max);
         if (header.inputBits() != 0 && header.inputBits() != grid.inputBits) {
             warn("Warning: 3DL file reader: input bit depth mismatch");
         }
     } else {
-        grid.origin = *min;
-        grid.range = *max - *min;
-        const auto digits = static_cast<double>(words[0].size() - point - 1);
-        tolerance = static_cast<float>(5.0 * std::pow(0.1, digits));
+        grid.origin = min;
+        grid.range = max - min;
     }
     // Deliberate: a maximum well below zero passes. Held by ThreeDLReader.ReadsFloatGrids.
-    if (std::fabs(*max) < 0.000001F) {
+    if (std::fabs(max) < 0.000001F) {
         throw Exception("3DL file reader: negative or zero max value");
     }
-    expectLinear(values, tolerance);
+    if (!isLinear) throw Exception("3DL file reader: LUT input values must be linear");
     return grid;
 }
 
@@ -169,37 +185,30 @@ void parseSample(std::string_view line, RGB& rgb) {
     rgb = RGB(toFloat(words[0]), toFloat(words[1]), toFloat(words[2]));
 }
 
-/// Stores the samples that the file has, up to the last point.
+/// Stores the samples that the file has, up to the last point, in its order.
 /// @return the largest number after offset and scale, not below 0
 float readLattice(LineSource& lines, const Scaling& scaling, LUT& lut, std::uint64_t& sampleCount) {
-    float* const samples = lut.data();
+    const std::size_t pointCount = LatticeSize::of(lut).pointCount();
+    float* sample = lut.data();
     float largest = 0.0F;
     std::string_view item;
     RGB rgb;
-    whileBlueFastest(LatticeSize::of(lut), [&](std::size_t element) {
-        if (!nextItem(lines, item)) return false;
+    for (; sampleCount < pointCount && nextItem(lines, item); ++sampleCount) {
         parseSample(item, rgb);
         for (unsigned c = 0; c < 3; ++c) {
             const float code = (rgb[c] - scaling.offset) / scaling.scale;
             largest = std::max(largest, code);
-            samples[3 * element + c] = code / scaling.outputMax;
+            *sample++ = code / scaling.outputMax;
         }
-        ++sampleCount;
-        return true;
-    });
+    }
     return largest;
 }
 
-/// Multiplies the samples that the file held; the memory of the others is left untouched.
+/// Multiplies the samples that the file held, which are in its order still.
 void multiply(LUT& lut, std::uint64_t sampleCount, float factor) {
     float* const samples = lut.data();
-    whileBlueFastest(LatticeSize::of(lut), [&](std::size_t element) {
-        if (sampleCount == 0) return false;
-        for (std::size_t c = 0; c < 3; ++c)
-            samples[3 * element + c] *= factor;
-        --sampleCount;
-        return true;
-    });
+    for (std::size_t i = 0; i < 3 * sampleCount; ++i)
+        samples[i] *= factor;
 }
 
 /// The smallest usual bit depth that holds a code; 0 if none does.
@@ -254,6 +263,7 @@ boost::shared_ptr<LUT> LUTFileReader3DL::read(const std::string& filename) {
     const float largest = readLattice(lines, scaling, *lut_, sampleCount_);
     const float factor = laterFactor(request, header, grid, outputBits, scaling.outputMax, largest);
     if (factor != 1.0F) multiply(*lut_, sampleCount_, factor);
+    placeBlueFastest(*lut_, sampleCount_);
     setDomain(*lut_, grid);
     return lut_;
 }

@@ -24,6 +24,7 @@
 #include "lut/Exception.h"
 #include "lut/LUT3D.h"
 #include "lut/io/Lattice.h"
+#include "lut/io/ShaperEntries.h"
 #include "lut/io/text/LineSource.h"
 #include "lut/io/text/Numbers.h"
 #include "lut/io/text/Tokens.h"
@@ -99,13 +100,15 @@ bool findData(LineSource& lines, Line& line, Sizes& sizes, boost::shared_ptr<LUT
 void readPreLUT(LineSource& lines, Line& line, int entryCount, Shaper& shaper) {
     if (entryCount <= 0) throw Exception(kPreLUTError);
     // The count is a claim: entries are made as they arrive.
-    shaper.entries.push_back(line.expectTriple(kPreLUTError));
+    ShaperEntries entries;
+    entries.push_back(line.expectTriple(kPreLUTError));
     for (int entry = 1; entry < entryCount; ++entry) {
         if (!line.next(lines)) throw Exception("CMS LUT reader: expecting more pre-LUT data.");
         // Deliberate: the message of the lattice from the second entry on, for comments as well;
         // callers may know it. Held by CMSReader.RefusesWhatIsNoTable.
-        shaper.entries.push_back(line.expectTriple(kDataError));
+        entries.push_back(line.expectTriple(kDataError));
     }
+    entries.moveTo(shaper);
     const auto count = static_cast<float>(entryCount);
     shaper.counts = RGB(count, count, count);
 }

@@ -20,12 +20,12 @@
 #include <array>
 #include <boost/smart_ptr/make_shared.hpp>
 #include <fstream>
-#include <vector>
 
 #include "lut/Exception.h"
 #include "lut/LUT1D.h"
 #include "lut/LUT3D.h"
 #include "lut/io/Lattice.h"
+#include "lut/io/ShaperEntries.h"
 #include "lut/io/text/LineSource.h"
 #include "lut/io/text/Numbers.h"
 #include "lut/io/text/Tokens.h"
@@ -36,21 +36,27 @@ namespace {
 constexpr char kNoMoreEntries[] =
     "CSP LUT reader: syntax error while reading LUT data, expecting more data.";
 
-/// This format's lines: trimmed; one that ends in a backslash has the next physical line joined to
-/// it behind a blank.
+/// This format's lines: trimmed; to one that ends in a backslash the next physical line is joined,
+/// with a blank between them.
 /// Deliberate: the backslash stays, as a word or the end of one, and a second one joins nothing.
 /// Held by CSPReader.JoinsALineThatEndsInABackslashOnce.
 class ItemSource {
 public:
     ItemSource(std::istream& text, std::uint64_t& lineNumber) : lines_(text, lineNumber) {}
 
-    /// A line of the header or a shaper, good until the next call.
+    /// A line of the header or a shaper, good until the next call. One that ends in a backslash is
+    /// no keyword, and the number that it may begin with ends there: what was joined to it counts
+    /// where words do.
     /// @return false at the end of the file, line is then empty
     bool next(std::string_view& line) {
+        joined_ = {};
         if (!lines_.next(line) || !join(line)) return false;
-        line = trim(line);
+        joined_ = trimEnd(joined_);
         return true;
     }
+
+    /// What was joined to that line, mostly nothing.
+    std::string_view joined() const { return joined_; }
 
     /// A sample: the first three numbers of a line.
     /// Deliberate: missing ones are 0, so that an empty line is a sample, and whatever follows them
@@ -63,6 +69,7 @@ public:
         if (!parsePlainTriple(line, rgb)) {
             if (!join(line)) return false;
             tokens_.split(line);
+            tokens_.add(joined_);
             rgb = RGB(toFloat(tokens_[0]), toFloat(tokens_[1]), toFloat(tokens_[2]));
         }
         std::copy_n(rgb.data_block(), 3, sample);
@@ -70,18 +77,22 @@ public:
     }
 
 private:
-    /// @return false if the file ends where the rest of the line should be, line is then empty
+    /// Trims a line and looks for what is joined to it.
+    /// @return false if the file ends where that should be, line is then empty
     bool join(std::string_view& line) {
         line = trim(line);
+        joined_ = {};
         if (line.empty() || line.back() != '\\') return true;
-        joined_.assign(line).append(" ");
-        if (!lines_.next(line)) return false;
-        line = joined_.append(line);
+        begin_.assign(line);
+        line = {};
+        if (!lines_.next(joined_)) return false;
+        line = begin_;
         return true;
     }
 
     LineSource lines_;
-    std::string joined_;
+    std::string begin_;  // the line that something is joined to
+    std::string_view joined_;
     Tokens tokens_;
 };
 
@@ -123,32 +134,34 @@ std::string_view expectShaperLine(ItemSource& items) {
     return line;
 }
 
-/// One line of a shaper. It never comes back empty: a shaper line has a word, so that a count of
-/// zero cannot agree with it.
-std::vector<float> readRow(ItemSource& items, int pointCount) {
-    const Tokens tokens(expectShaperLine(items));
+/// One line of a shaper: the numbers of a channel. There is at least one, since a shaper line has a
+/// word, so that a count of zero cannot agree with it.
+void readRow(ItemSource& items, int pointCount, unsigned channel, ShaperEntries& entries) {
+    const std::string_view line = expectShaperLine(items);
     // The count is a claim: room is made only for the numbers that are there.
-    if (static_cast<std::int64_t>(tokens.count()) != pointCount) {
+    const std::size_t count = countWords(line) + countWords(items.joined());
+    if (static_cast<std::int64_t>(count) != pointCount) {
         throw Exception(
             "CSP LUT reader: found different number of data elements than pre-LUT size specified.");
     }
-    std::vector<float> row(tokens.count());
-    for (std::size_t i = 0; i < row.size(); ++i)
-        row[i] = toFloat(tokens[i]);
-    return row;
+    entries.grow(count);
+    std::size_t entry = 0;
+    std::string_view word;
+    for (std::string_view text : {line, items.joined()}) {
+        while (takeWord(text, word))
+            entries[entry++][channel] = toFloat(word);
+    }
 }
 
-/// Three rows side by side, the shorter ones continued with their last value.
-Shaper merge(const std::array<std::vector<float>, 3>& rows) {
-    Shaper shaper;
-    shaper.entries.resize(std::max({rows[0].size(), rows[1].size(), rows[2].size()}));
+/// Makes a shaper of three channels, the shorter ones continued with their last value.
+void finish(ShaperEntries& entries, const std::array<int, 3>& pointCounts, Shaper& shaper) {
     for (unsigned c = 0; c < 3; ++c) {
-        const std::vector<float>& row = rows[c];
-        shaper.counts[c] = static_cast<float>(row.size());
-        for (std::size_t i = 0; i < shaper.entries.size(); ++i)
-            shaper.entries[i][c] = i < row.size() ? row[i] : row.back();
+        shaper.counts[c] = static_cast<float>(pointCounts[c]);
+        const auto count = static_cast<std::size_t>(pointCounts[c]);
+        for (std::size_t i = count; i < entries.size(); ++i)
+            entries[i][c] = entries[count - 1][c];
     }
-    return shaper;
+    entries.moveTo(shaper);
 }
 
 void readShapers(ItemSource& items, LUT& lut) {
@@ -159,16 +172,17 @@ void readShapers(ItemSource& items, LUT& lut) {
         skipMetadata(items);
         countLine = expectShaperLine(items);
     }
-    std::array<std::vector<float>, 3> inputs;
-    std::array<std::vector<float>, 3> outputs;
+    std::array<int, 3> pointCounts;
+    ShaperEntries inputs;
+    ShaperEntries outputs;
     for (unsigned c = 0; c < 3; ++c) {
         if (c > 0) countLine = expectShaperLine(items);
-        const int pointCount = toInt(countLine);
-        inputs[c] = readRow(items, pointCount);
-        outputs[c] = readRow(items, pointCount);
+        pointCounts[c] = toInt(countLine);
+        readRow(items, pointCounts[c], c, inputs);
+        readRow(items, pointCounts[c], c, outputs);
     }
-    lut.inputShaper = merge(inputs);
-    lut.outputShaper = merge(outputs);
+    finish(inputs, pointCounts, lut.inputShaper);
+    finish(outputs, pointCounts, lut.outputShaper);
 }
 
 void readCurve(ItemSource& items, LUT& lut, std::uint64_t& sampleCount) {
@@ -185,7 +199,8 @@ void readCurve(ItemSource& items, LUT& lut, std::uint64_t& sampleCount) {
 }
 
 void readLattice(ItemSource& items, LUT& lut, std::uint64_t& sampleCount) {
-    const Tokens tokens(nextFilled(items));
+    Tokens tokens(nextFilled(items));
+    tokens.add(items.joined());
     if (tokens.count() != 3) {
         throw Exception("CSP LUT reader: syntax error while reading 3D LUT size.");
     }

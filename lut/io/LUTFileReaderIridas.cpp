@@ -30,9 +30,6 @@ namespace {
 
 constexpr char kDataError[] = "Iridas LUT reader: syntax error while reading LUT data.";
 
-/// One more than a line of data has.
-constexpr std::size_t kMostWords = 4;
-
 /// The table of the latest size line, and where the next sample goes. A second size line replaces
 /// the table and leaves the position.
 class Target {
@@ -103,7 +100,7 @@ boost::shared_ptr<LUT> LUTFileReaderIridas::read(const std::string& filename) {
     while (lines.next(line)) {
         const bool isPlain = parsePlainTriple(line, rgb);
         if (!isPlain) {
-            tokens.split(line, kMostWords);
+            tokens.split(line);
             if (isIgnored(tokens[0])) continue;
             if (isSize(tokens[0])) {
                 lut_ = target.start(tokens[0], tokens[1]);

@@ -21,16 +21,16 @@
 #include "lut/io/LUTFileReaderTruelight.h"
 
 #include <algorithm>
-#include <boost/algorithm/string/case_conv.hpp>
+#include <boost/algorithm/string/predicate.hpp>
 #include <boost/smart_ptr/make_shared.hpp>
 #include <fstream>
 #include <locale>
 #include <stdexcept>
-#include <vector>
 
 #include "lut/Exception.h"
 #include "lut/LUT3D.h"
 #include "lut/io/Lattice.h"
+#include "lut/io/ShaperEntries.h"
 #include "lut/io/text/LineSource.h"
 #include "lut/io/text/Numbers.h"
 #include "lut/io/text/Tokens.h"
@@ -89,13 +89,14 @@ void readInputLUTLength(const Tokens& tokens, Shaper& inputLUT) {
 bool readKeyword(const Tokens& tokens, LUT& lut, Cube& cube, Data& data) {
     // Deliberate: lines are not trimmed, so a carriage return is part of the keyword that it
     // follows, which is then unknown. Held by TruelightReader.DoesNotKnowAKeywordWithAReturn.
-    const std::string keyword =
-        boost::algorithm::to_lower_copy(std::string(tokens[1]), std::locale::classic());
-    if (keyword == "width") readWidth(tokens, cube);
-    if (keyword == "lutlength") readInputLUTLength(tokens, lut.outputShaper);
-    if (keyword == "inputlut") data = Data::InputLUT;
-    if (keyword == "cube") data = Data::Cube;
-    return keyword != "end";
+    const auto isKeyword = [&](const char* keyword) {
+        return boost::algorithm::iequals(tokens[1], keyword, std::locale::classic());
+    };
+    if (isKeyword("width")) readWidth(tokens, cube);
+    if (isKeyword("lutlength")) readInputLUTLength(tokens, lut.outputShaper);
+    if (isKeyword("inputlut")) data = Data::InputLUT;
+    if (isKeyword("cube")) data = Data::Cube;
+    return !isKeyword("end");
 }
 
 /// A data line that is no plain triple: three words, of which trimming leaves three.
@@ -123,7 +124,7 @@ boost::shared_ptr<LUT> LUTFileReaderTruelight::read(const std::string& filename)
     const auto lut = boost::make_shared<LUT3D>();
     lut_ = lut;
     Cube cube(*lut);
-    std::vector<RGB>& inputLUT = lut->outputShaper.entries;
+    ShaperEntries inputLUT;
     Data data = Data::Cube;
     std::string_view line;
     Tokens tokens;
@@ -150,6 +151,7 @@ boost::shared_ptr<LUT> LUTFileReaderTruelight::read(const std::string& filename)
     }
     // An input LUT leads from inputs to lattice positions by itself: identity.
     if (inputLUT.empty()) setUnitDomain(*lut, lut->width(), lut->height(), lut->depth());
+    inputLUT.moveTo(lut->outputShaper);
     return lut;
 }
 

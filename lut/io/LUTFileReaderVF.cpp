@@ -87,9 +87,6 @@ void readParameter(const Tokens& words, LUT3D& lut, Placement& placement) {
 /// Reads up to and including the line "data". A file that does without "parameters" loses the line
 /// in its place and has no parameters.
 Placement readParameters(LineSource& lines, LUT3D& lut) {
-    // One word more than the longest parameter has, so that too many show: a line of a compressed
-    // file can hold millions.
-    constexpr std::size_t kMostWords = 18;
     Placement placement;
     if (trim(nextLine(lines)) != "parameters") return placement;
     std::string_view line;
@@ -97,28 +94,29 @@ Placement readParameters(LineSource& lines, LUT3D& lut) {
     while (lines.next(line)) {
         line = trim(line);
         if (line == "data") break;
-        words.split(line, kMostWords);
+        words.split(line);
         readParameter(words, lut, placement);
     }
     return placement;
 }
 
 void readSamples(LineSource& lines, LUT3D& lut, std::uint64_t& sampleCount) {
-    float* const samples = lut.data();
+    const std::size_t pointCount = LatticeSize::of(lut).pointCount();
+    float* sample = lut.data();
     Tokens words;
     RGB rgb;
-    forEachBlueFastest(LatticeSize::of(lut), [&](std::size_t element) {
+    for (; sampleCount < pointCount; ++sampleCount) {
         const std::string_view line = nextLine(lines);
         if (!parsePlainTriple(line, rgb)) {
-            words.split(line, 4);
+            words.split(line);
             if (words.count() != 3) {
                 throw Exception("VF file reader: syntax error while reading LUT data.");
             }
             rgb = RGB(toFloat(words[0]), toFloat(words[1]), toFloat(words[2]));
         }
-        std::copy_n(rgb.data_block(), 3, samples + 3 * element);
-        ++sampleCount;
-    });
+        sample = std::copy_n(rgb.data_block(), 3, sample);
+    }
+    placeBlueFastest(lut, pointCount);
 }
 
 }  // namespace

@@ -62,6 +62,14 @@ void forEachBlueFastest(const LatticeSize& size, Visit&& visit) {
     });
 }
 
+/// Moves samples that a blue-fastest file's reader stored one behind the other to their places.
+///
+/// Storing them in place at once would touch a page of memory for nearly each, however few a file
+/// holds of the lattice that it claims.
+/// @param sampleCount  how many there are: all of them, unless the lattice is a cube. Behind them
+///                     are zeros
+void placeBlueFastest(LUT& lut, std::size_t sampleCount);
+
 /// Where the next data line of a file goes, for formats whose data wraps round at the end.
 struct LatticePosition {
     int r = 0;

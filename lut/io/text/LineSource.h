@@ -13,7 +13,7 @@ class LineSource {
 public:
     /// Longest line in bytes, its end included: a small compressed file can hold an enormous one.
     /// Of a longer line this much is delivered, and nothing after it.
-    static constexpr std::size_t kLongestLine = std::size_t{64} << 20;
+    static constexpr std::size_t kLongestLine = std::size_t{16} << 20;
 
     /// @param text        read from where it stands, in large blocks; outlives this object
     /// @param lineNumber  set to 0, then kept at the number of the line delivered last

@@ -1,10 +1,12 @@
 #include "lut/io/text/Numbers.h"
 
+#include <algorithm>
 #include <boost/endian/conversion.hpp>
 #include <charconv>
 #include <clocale>
 #include <cstdlib>
 #include <cstring>
+#include <limits>
 #include <string>
 #include <system_error>
 
@@ -131,8 +133,19 @@ float toFloat(std::string_view token) {
 }
 
 std::int32_t toInt(std::string_view token) {
-    const std::string text(token);  // ends at an embedded NUL, as a C string does
-    return static_cast<std::int32_t>(std::strtol(text.c_str(), nullptr, 10));
+    token.remove_prefix(std::min(token.find_first_not_of(" \t\n\v\f\r"), token.size()));
+    const bool isNegative = !token.empty() && token.front() == '-';
+    if (!token.empty() && token.front() == '+') {
+        token.remove_prefix(1);
+        if (!token.empty() && token.front() == '-') return 0;  // from_chars would take it
+    }
+    long number = 0;
+    const auto [stop, error] = std::from_chars(token.data(), token.data() + token.size(), number);
+    if (error == std::errc::result_out_of_range) {
+        using Limits = std::numeric_limits<long>;
+        number = isNegative ? Limits::min() : Limits::max();
+    }
+    return static_cast<std::int32_t>(number);
 }
 
 bool parsePlainTriple(std::string_view line, RGB& rgb) {

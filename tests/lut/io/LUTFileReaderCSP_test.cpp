@@ -100,7 +100,7 @@ TEST(CSPReader, TakesEveryLineForASample) {
 
 TEST(CSPReader, JoinsALineThatEndsInABackslashOnce) {
     const std::string rows = replaced(upToSize("1D"), "2\n0 1\n", "3\n0 \\ \n 1\\\n");
-    const auto shaper = readBytes(".csp", replaced(rows, "0 1\n", "3 4\\\n5\n") + "0\n");
+    const auto shaper = readBytes(".csp", replaced(rows, "0 1\n", "3 4\\\n5 \r\n") + "0\n");
     expectRGB(shaper->inputShaper.entries[1], 0.0F, 1.0F, 1.0F);  // the lone backslash is a word
     EXPECT_EQ(shaper->inputShaper.entries[2][0], 1.0F);
     EXPECT_EQ(shaper->outputShaper.entries[1][0], 4.0F);
@@ -110,6 +110,7 @@ TEST(CSPReader, JoinsALineThatEndsInABackslashOnce) {
     expectRGB(samples->get(0), 1.0F, 2.0F, 3.0F);
     expectRGB(samples->get(1), 4.0F, 5.0F, 0.0F);
     EXPECT_EQ(messageOf([] { readBytes(".csp", upToSize("1D") + "1\n1 2 3\\"); }), kNoMore1D);
+    EXPECT_EQ(readBytes(".csp", upToSize("3D") + "1 1\\\n1\n1 2 3\n")->depth(), 1);
 }
 
 TEST(CSPReader, RefusesWhatIsNoTable) {

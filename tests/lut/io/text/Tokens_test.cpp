@@ -13,6 +13,8 @@ TEST(Trim, TakesWhiteSpaceOffBothEnds) {
     EXPECT_EQ(ol::trim("a"), "a");
     EXPECT_EQ(ol::trim(" \t\r\n"), "");
     EXPECT_EQ(ol::trim({}), "");
+    EXPECT_EQ(ol::trimEnd(" \t\r a \v\f"), " \t\r a");
+    EXPECT_EQ(ol::trimEnd(" \t\r"), "");
     const std::string strange(" \0 \xa0 ", 5);  // neither is white space
     EXPECT_EQ(ol::trim(strange), std::string("\0 \xa0", 3));
 }
@@ -32,6 +34,17 @@ TEST(Tokens, AreSeparatedByRunsOfBlanksAndTabs) {
     }
     tokens.split({});
     EXPECT_EQ(tokens.count(), 0U);
+
+    std::string line;
+    for (std::size_t i = 0; i < 100; ++i)
+        line += std::to_string(i) + "\t";
+    EXPECT_EQ(ol::countWords(line), 100U);
+    tokens.split("first second");
+    tokens.add(line);
+    EXPECT_EQ(tokens.count(), ol::Tokens::kMost);
+    EXPECT_EQ(tokens[1], "second");
+    EXPECT_EQ(tokens[17], "15");
+    EXPECT_EQ(tokens[18], "");
 }
 
 }  // namespace
