@@ -11,7 +11,7 @@ foreach(folder lut lut/property lut/io/zlib_stream)
     file(GLOB headers ${PROJECT_SOURCE_DIR}/${folder}/*.h)
     install(FILES ${headers} DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}/orlith/${folder})
 endforeach()
-install(FILES lut/io/LUTFileReader.h lut/io/LUTFileWriter.h lut/io/Registry.h
+install(FILES lut/io/LUTFileReader.h lut/io/LUTFileWriter.h lut/io/Registry.h lut/io/Remarks.h
     DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}/orlith/lut/io)
 
 configure_package_config_file(cmake/OrlithConfig.cmake.in OrlithConfig.cmake

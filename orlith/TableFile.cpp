@@ -37,6 +37,8 @@ std::string parseOutputBitDepth(const std::string& text, int& bits) {
 
 void setReaderProperties(ol::LUTFileReader& reader, const ReadOptions& options) {
     const auto set = [&](const char* name, auto property) { reader.setProperty(name, property); };
+    set("interchange",
+        property::makeProperty<property::Int>("interchange", options.isStrict ? 0 : 1));
     set("format3DL", property::makeProperty<property::String>("format3DL", options.format3DL));
     set("outputBitDepth",
         property::makeProperty<property::Int>("outputBitDepth", options.outputBitDepth));
@@ -55,6 +57,32 @@ void expectReadableFile(const std::string& path, const std::string& name) {
     if (std::filesystem::is_directory(path, ignored)) throw Failure(name + ": is a folder");
     if (access(path.c_str(), R_OK) != 0) {
         throw Failure(fmt::format("{}: {}", name, std::generic_category().message(errno)));
+    }
+}
+
+/// The reason that a reader gives for its failure.
+std::string reasonOf(const ol::LUTFileReader& reader) {
+    const auto remarks = reader.remarks();
+    return remarks.empty() ? "" : fmt::format(" ({})", remarks.back().text);
+}
+
+/// What by the book is no table may be one as its maker meant it.
+std::string adviceOn(const std::string& file, const ReadOptions& options) {
+    if (!options.isStrict || !std::filesystem::is_regular_file(file)) return "";
+    ReadOptions asMeant = options;
+    asMeant.isStrict = false;
+    try {
+        readTable(file, asMeant);
+        return "; it can be read without --strict";
+    } catch (const Failure&) {
+        return "";
+    }
+}
+
+void warnOfRemarks(const Table& table) {
+    for (const ol::Remark& remark : table.remarks) {
+        const std::string line = remark.line == 0 ? "" : fmt::format(":{}", remark.line);
+        warn(fmt::format("{}{}: {}", table.name, line, remark.text));
     }
 }
 
@@ -157,7 +185,8 @@ Table readTable(const std::string& path, const ReadOptions& options, const std::
     try {
         table.lut = reader->read(file);
     } catch (const ol::Exception& exception) {
-        throw Failure(fmt::format("{}: {}", place(table.name, *reader), exception.message()));
+        throw Failure(fmt::format("{}: {}{}{}", place(table.name, *reader), exception.message(),
+                                  reasonOf(*reader), adviceOn(file, options)));
     } catch (const std::length_error&) {
         throw Failure(
             fmt::format("{}: declares a size that no table can have", place(table.name, *reader)));
@@ -167,11 +196,13 @@ Table readTable(const std::string& path, const ReadOptions& options, const std::
     }
     table.samplesRead = reader->sampleCount();
     table.pointCount = pointCount(*table.lut);
+    table.remarks = reader->remarks();
     return table;
 }
 
 Table readTableAndWarn(const std::string& path, const ReadOptions& options) {
     Table table = readTable(path, options);
+    warnOfRemarks(table);
     if (table.samplesRead != table.pointCount) warn(sampleCounts(table));
     return table;
 }
@@ -179,6 +210,7 @@ Table readTableAndWarn(const std::string& path, const ReadOptions& options) {
 Table readWholeTable(const std::string& path, const ReadOptions& options) {
     Table table = readTable(path, options);
     if (!table.isFilled()) throw Failure(sampleCounts(table));
+    warnOfRemarks(table);
     if (table.samplesRead != table.pointCount) warn(sampleCounts(table));
     return table;
 }

@@ -4,15 +4,17 @@
 #include <boost/smart_ptr/shared_ptr.hpp>
 #include <cstdint>
 #include <string>
+#include <vector>
 
 #include "lut/LUT.h"
+#include "lut/io/Remarks.h"
 
 namespace orlith {
 
 /// How a table file is read: --from, --strict, and the options of .3dl files, which others ignore.
 struct ReadOptions {
     std::string from;       ///< extension with its dot; empty: the file's own
-    bool isStrict = false;  ///< by the book: a file with too few samples is a table too
+    bool isStrict = false;  ///< by the book, not as other programs mean their files
     std::string format3DL = "auto";
     int outputBitDepth = kDetect;
     bool normalizeOutput = false;
@@ -31,6 +33,7 @@ struct Table {
     std::string extension;
     std::uint64_t samplesRead = 0;
     std::uint64_t pointCount = 0;  ///< of the table
+    std::vector<Orlith::LUT::Remark> remarks;
 
     bool isFilled() const { return samplesRead >= pointCount; }
 };
@@ -41,7 +44,8 @@ struct Table {
 /// @throws Failure  the file's name, the line, and the library's message
 Table readTable(const std::string& path, const ReadOptions& options, const std::string& name = "");
 
-/// Reads a table, and warns where its file held fewer or more samples than it has points.
+/// Reads a table, and warns of what its reader remarked, and where its file held fewer or more
+/// samples than it has points.
 Table readTableAndWarn(const std::string& path, const ReadOptions& options);
 
 /// Likewise, but fewer samples are a failure: what is missing is no black.

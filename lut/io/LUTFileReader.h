@@ -3,11 +3,22 @@
 #include <boost/smart_ptr/shared_ptr.hpp>
 #include <cstdint>
 #include <string>
+#include <vector>
 
 #include "lut/LUT.h"
+#include "lut/io/Remarks.h"
 #include "lut/property/PropertySet.h"
 
 namespace Orlith::LUT {
+
+/// A read that is under way.
+struct Reading {
+    bool isMeant;  ///< as other programs mean the file; false: by the book
+    Remarks& remarks;
+    const std::uint64_t& lineNumber;
+    const std::uint64_t& sampleCount;
+    const boost::shared_ptr<LUT>& table;  ///< the reader's current one
+};
 
 /// Reads a table from a file; one kind of reader for each format. A reader can be used again.
 /// Binary  the order of the virtual functions is fixed: new ones go last.
@@ -25,6 +36,9 @@ public:
     virtual boost::shared_ptr<LUT> read(const std::string& filename) = 0;
 
     /// Options of the format. A name that is taken keeps its property; the result says so by false.
+    ///
+    /// All formats know "interchange" (Int, 0 when absent): 0 goes by the letter of the format, 1
+    /// takes what other programs write and gives the table that they mean by it.
     bool setProperty(const std::string& name, const boost::shared_ptr<Property::Base>& property) {
         return properties_.insert(name, property);
     }
@@ -41,13 +55,31 @@ public:
     /// Samples of the table that the file held, surplus ones that overwrote others included.
     std::uint64_t sampleCount() const { return sampleCount_; }
 
+    /// What the last read forgave, did not use or stumbled over; after a failure the last one is
+    /// its reason in words.
+    std::vector<Remark> remarks() const { return remarks_.list(); }
+
 protected:
     const Property::PropertySet& properties() const { return properties_; }
+
+    /// The value of "interchange".
+    bool isInterchange() const {
+        const auto property = properties_.find("interchange");
+        const auto* flag = Property::asInt(property.get(), 1);
+        return flag != nullptr && flag->values[0] != 0;
+    }
+
+    /// What stands beside the book needs to know of this read.
+    Reading reading() { return {isInterchange(), remarks_, lineNumber_, sampleCount_, lut_}; }
+
+    /// Fails because the file cannot be opened, as errno says.
+    [[noreturn]] void failToOpen(const char* message);
 
     /// Forgets the last read: call first in read.
     void beginRead() {
         lineNumber_ = 0;
         sampleCount_ = 0;
+        remarks_.clear();
     }
 
     boost::shared_ptr<LUT> lut_;  ///< the reader's current table
@@ -58,6 +90,7 @@ private:
 protected:
     std::uint64_t lineNumber_ = 0;
     std::uint64_t sampleCount_ = 0;
+    Remarks remarks_;
 };
 
 }  // namespace Orlith::LUT

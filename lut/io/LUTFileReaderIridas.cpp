@@ -21,6 +21,7 @@
 #include "lut/LUT1D.h"
 #include "lut/LUT3D.h"
 #include "lut/io/Lattice.h"
+#include "lut/io/interchange/CubeInterchange.h"
 #include "lut/io/text/LineSource.h"
 #include "lut/io/text/Numbers.h"
 #include "lut/io/text/Tokens.h"
@@ -90,15 +91,23 @@ bool isSize(std::string_view keyword) {
 boost::shared_ptr<LUT> LUTFileReaderIridas::read(const std::string& filename) {
     beginRead();
     std::ifstream file(filename);
-    if (!file) throw Exception("Iridas LUT reader: unable to open file.");
-    LineSource lines(file, lineNumber_);
+    if (!file) failToOpen("Iridas LUT reader: unable to open file.");
+    CubeInterchange meant(reading());
+    LineSource lines(file, lineNumber_, &meant);
+    return meant.explainFailures([&] {
+        const auto lut = readTable(lines);
+        meant.finish(*lut, lines);
+        return lut;
+    });
+}
 
+boost::shared_ptr<LUT> LUTFileReaderIridas::readTable(LineSource& lines) {
     Target target;
     std::string_view line;
     Tokens tokens;
     RGB rgb;
     while (lines.next(line)) {
-        const bool isPlain = parsePlainTriple(line, rgb);
+        const bool isPlain = lines.parseTriple(line, rgb);
         if (!isPlain) {
             tokens.split(line);
             if (isIgnored(tokens[0])) continue;

@@ -25,7 +25,9 @@ public:
     /// Options of the format. A name that is taken keeps its property; the result says so by false.
     ///
     /// All text formats know "flushLines" (Int, 1 when absent): 1 hands every line to the system
-    /// when it is complete, 0 gathers lines into large blocks.
+    /// when it is complete, 0 gathers lines into large blocks. All formats know "interchange" (Int,
+    /// 0 when absent): 0 goes by the letter of the format, 1 writes what other programs read as
+    /// this table's look.
     bool setProperty(const std::string& name, const boost::shared_ptr<Property::Base>& property) {
         return properties_.insert(name, property);
     }
@@ -38,13 +40,18 @@ protected:
     const Property::PropertySet& properties() const { return properties_; }
 
     /// The value of "flushLines".
-    bool flushesLines() const {
-        const auto property = properties_.find("flushLines");
-        const auto* flag = Property::asInt(property.get(), 1);
-        return flag == nullptr || flag->values[0] != 0;
-    }
+    bool flushesLines() const { return flag("flushLines", true); }
+
+    /// The value of "interchange".
+    bool isInterchange() const { return flag("interchange", false); }
 
 private:
+    bool flag(const char* name, bool whenAbsent) const {
+        const auto property = properties_.find(name);
+        const auto* value = Property::asInt(property.get(), 1);
+        return value == nullptr ? whenAbsent : value->values[0] != 0;
+    }
+
     Property::PropertySet properties_;
 
 protected:

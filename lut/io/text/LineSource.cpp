@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <cstring>
 
+#include "lut/io/text/Numbers.h"
+
 namespace Orlith::LUT {
 namespace {
 
@@ -10,12 +12,32 @@ constexpr std::size_t kBlockBytes = std::size_t{256} << 10;
 
 }  // namespace
 
-LineSource::LineSource(std::istream& text, std::uint64_t& lineNumber)
-    : text_(text), lineNumber_(lineNumber) {
+LineSource::LineSource(std::istream& text, std::uint64_t& lineNumber, LineFilter* filter)
+    : text_(text), lineNumber_(lineNumber), filter_(filter) {
     lineNumber_ = 0;
 }
 
 bool LineSource::next(std::string_view& line) {
+    if (filter_ == nullptr) return nextPhysical(line);
+    while (nextPhysical(line)) {
+        isTriple_ = parsePlainTriple(line, triple_);
+        if (isTriple_ && !filter_->wantsPlainTriples()) return true;
+        if (!filter_->pass(line)) continue;
+        isTriple_ = parsePlainTriple(line, triple_);
+        return true;
+    }
+    filter_->end();
+    isTriple_ = false;
+    return false;
+}
+
+bool LineSource::parseTriple(std::string_view line, RGB& rgb) const {
+    if (filter_ == nullptr) return parsePlainTriple(line, rgb);
+    if (isTriple_) rgb = triple_;
+    return isTriple_;
+}
+
+bool LineSource::nextPhysical(std::string_view& line) {
     std::size_t searched = 0;  // bytes after begin_ that hold no line end
     for (;;) {
         const char* start = buffer_.data() + begin_;

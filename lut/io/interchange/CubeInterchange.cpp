@@ -1,0 +1,128 @@
+#include "lut/io/interchange/CubeInterchange.h"
+
+#include <cstddef>
+
+#include "lut/io/text/Numbers.h"
+#include "lut/io/text/Tokens.h"
+
+namespace Orlith::LUT {
+namespace {
+
+constexpr char kDataError[] = "Iridas LUT reader: syntax error while reading LUT data.";
+constexpr char kSizeError[] = "Iridas LUT reader: syntax error while reading LUT size.";
+constexpr char kNoTable[] = "Iridas LUT reader: LUT failed to initialise.";
+
+constexpr int kFewestPoints = 2;  // one point has no slope
+
+}  // namespace
+
+const char* CubeInterchange::dataError() const {
+    return kDataError;
+}
+
+bool CubeInterchange::wantsPlainTriples() const {
+    return isMeant() && latticeSize_ > 0 && shaper_.size() < static_cast<std::size_t>(curveSize_);
+}
+
+bool CubeInterchange::takeKeyword(std::string_view line) {
+    const Tokens words(line);
+    const std::string_view keyword = words[0];
+    if (keyword == "TITLE") return false;
+    if (keyword == "LUT_1D_SIZE" || keyword == "LUT_3D_SIZE") {
+        const bool isCurve = keyword == "LUT_1D_SIZE";
+        int& size = isCurve ? curveSize_ : latticeSize_;
+        if (size != 0 || sampleCount() > 0) fail(kSizeError, "a second size line");
+        size = toInt(words[1]);
+        if (size < kFewestPoints) fail(kSizeError, "a table needs at least 2 points a side");
+        // The lattice is the table, and the curve its shaper, whichever comes first.
+        return !(isCurve && latticeSize_ > 0);
+    }
+    if (keyword == "DOMAIN_MIN") {
+        domainMin_ = expectNumbersBehind(line, 3);
+    } else if (keyword == "DOMAIN_MAX") {
+        domainMax_ = expectNumbersBehind(line, 3);
+    } else if (keyword == "LUT_1D_INPUT_RANGE") {
+        takeRange(curveRange_, line);
+    } else if (keyword == "LUT_3D_INPUT_RANGE") {
+        takeRange(latticeRange_, line);
+    } else {
+        remark("unknown", quoted(keyword) + " is not known and not used");
+    }
+    return false;
+}
+
+bool CubeInterchange::takeNumbers(std::string_view line) {
+    if (!wantsPlainTriples()) return true;
+    const Tokens words(line);
+    if (words.count() != 3) fail(kDataError, "a line of the 1D block needs three numbers");
+    shaper_.emplace_back(toFloat(words[0]), toFloat(words[1]), toFloat(words[2]));
+    return false;
+}
+
+void CubeInterchange::takeRange(boost::optional<Range>& range, std::string_view line) {
+    const RGB ends = expectNumbersBehind(line, 2);
+    range = Range{RGB(ends[0], ends[0], ends[0]), RGB(ends[1], ends[1], ends[1])};
+}
+
+void CubeInterchange::expectRising(const Range& range) {
+    for (unsigned c = 0; c < 3; ++c) {
+        if (!(range.min[c] < range.max[c])) fail(kDataError, "the domain does not rise");
+    }
+}
+
+void CubeInterchange::finish(LUT& lut, LineSource& lines) {
+    expectAllSamples(lut, lines);
+    if (!isMeant()) return;
+    const bool hasShaper = latticeSize_ > 0 && curveSize_ > 0;
+    // The domain of a file is that of its first block.
+    boost::optional<Range>& first = lut.is1D() || hasShaper ? curveRange_ : latticeRange_;
+    if (domainMin_ || domainMax_) {
+        first = Range{domainMin_.value_or(RGB(0.0F, 0.0F, 0.0F)),
+                      domainMax_.value_or(RGB(1.0F, 1.0F, 1.0F))};
+    }
+    if (!lut.is1D() && !hasShaper && curveRange_) {
+        remark("range", "\"LUT_1D_INPUT_RANGE\" is not used: the file has no 1D block");
+    }
+    const boost::optional<Range>& domain = lut.is1D() ? curveRange_ : latticeRange_;
+    if (domain) {
+        expectRising(*domain);
+        const int size = lut.width();
+        setDomain(lut, domain->min, domain->max, {size, size, size});
+    }
+    if (!hasShaper) return;
+    if (curveRange_) {
+        expectRising(*curveRange_);
+        lut.inputShaper.entries = {curveRange_->min, curveRange_->max};
+        lut.inputShaper.counts.fill(2.0F);
+    }
+    lut.outputShaper.counts.fill(static_cast<float>(shaper_.size()));
+    lut.outputShaper.entries = std::move(shaper_);
+}
+
+void CubeInterchange::watch(std::string_view line) {
+    const Tokens words(line);
+    const std::string_view keyword = words[0];
+    if (keyword == "LUT_1D_INPUT_RANGE" || keyword == "LUT_3D_INPUT_RANGE") {
+        // Three words, as a sample has.
+        remark("range", quoted(keyword) + " is taken for a sample");
+    }
+    const bool isMin = keyword == "DOMAIN_MIN";
+    if (!isMin && keyword != "DOMAIN_MAX") return;
+    const float usual = isMin ? 0.0F : 1.0F;
+    for (std::size_t i = 1; i <= 3; ++i) {
+        if (toFloat(words[i]) == usual) continue;
+        remark("domain", "the domain is not used: the table covers 0 to 1");
+        return;
+    }
+}
+
+std::string CubeInterchange::reasonOf(std::string_view message, std::string_view lastLine) {
+    const Tokens words(lastLine);
+    if (message == kSizeError) return quoted(words[1]) + " is no size";
+    if (message == kNoTable && lastLine.empty()) {
+        return "there is no line LUT_1D_SIZE or LUT_3D_SIZE";
+    }
+    return "";
+}
+
+}  // namespace Orlith::LUT

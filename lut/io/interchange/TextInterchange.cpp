@@ -1,0 +1,180 @@
+#include "lut/io/interchange/TextInterchange.h"
+
+#include <algorithm>
+#include <charconv>
+#include <cmath>
+#include <system_error>
+
+#include "lut/io/text/Numbers.h"
+#include "lut/io/text/Tokens.h"
+
+namespace Orlith::LUT {
+namespace {
+
+constexpr std::string_view kByteOrderMark = "\xef\xbb\xbf";
+
+bool isDigit(char c) {
+    return c >= '0' && c <= '9';
+}
+
+bool isLetter(char c) {
+    return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z') || c == '_';
+}
+
+/// Whether a whole word is a number, finite or not. What is too small or too large for double
+/// precision is one as well; toFloat gives 0 or infinity for it.
+bool isNumber(std::string_view word) {
+    if (word.size() > 1 && word[0] == '+' && word[1] != '-') word.remove_prefix(1);
+    double number = 0.0;
+    const char* const end = word.data() + word.size();
+    const auto result = std::from_chars(word.data(), end, number);
+    return result.ec != std::errc::invalid_argument && result.ptr == end;
+}
+
+/// "0,5": digits, one comma, digits, perhaps with a sign.
+bool hasDecimalComma(std::string_view word) {
+    if (!word.empty() && (word[0] == '-' || word[0] == '+')) word.remove_prefix(1);
+    const std::size_t comma = word.find(',');
+    if (comma == std::string_view::npos || comma == 0 || comma + 1 == word.size()) return false;
+    return std::all_of(word.begin(), word.end(), [](char c) { return isDigit(c) || c == ','; }) &&
+           word.find(',', comma + 1) == std::string_view::npos;
+}
+
+std::uint64_t pointCount(const LUT& lut) {
+    const auto width = static_cast<std::uint64_t>(lut.width());
+    return lut.is1D() ? width
+                      : width * static_cast<std::uint64_t>(lut.height()) *
+                            static_cast<std::uint64_t>(lut.depth());
+}
+
+}  // namespace
+
+std::string quoted(std::string_view word) {
+    constexpr std::size_t kMost = 40;
+    std::string text = "\"";
+    for (const char c : word.substr(0, kMost)) {
+        if (c == '\r') {
+            text += "\\r";
+        } else if (static_cast<unsigned char>(c) < 0x20 || c == 0x7f) {
+            text += '?';
+        } else {
+            text += c;
+        }
+    }
+    return text + (word.size() > kMost ? "...\"" : "\"");
+}
+
+void setDomain(LUT& lut, const RGB& min, const RGB& max, const int (&points)[3]) {
+    lut.transform.set_identity();
+    for (unsigned c = 0; c < 3; ++c) {
+        lut.transform[c][c] = (max[c] - min[c]) / static_cast<float>(points[c] - 1);
+        lut.transform[3][c] = min[c];
+    }
+}
+
+bool TextInterchange::pass(std::string_view& line) {
+    constexpr std::size_t kMostKept = 200;
+    lastLine_.assign(line.substr(0, kMostKept));
+    lastLineNumber_ = lineNumber();
+    if (isMeant()) return passMeant(line);
+    watch(line);
+    return true;
+}
+
+bool TextInterchange::passMeant(std::string_view& line) {
+    if (lineNumber() == 1 && line.substr(0, kByteOrderMark.size()) == kByteOrderMark) {
+        line.remove_prefix(kByteOrderMark.size());
+    }
+    line = trim(line);
+    if (isVerbatim(line)) return true;
+    if (line.empty()) return false;
+    if (line[0] == '#') return takeComment(line);
+    std::string_view rest = line;
+    std::string_view word;
+    takeWord(rest, word);
+    if (isLetter(word[0]) && !isNumber(word)) return takeKeyword(line);
+
+    if (line.find(',') != std::string_view::npos) {
+        rewritten_.clear();
+        for (rest = line; takeWord(rest, word);) {
+            if (!rewritten_.empty()) rewritten_ += ' ';
+            const std::size_t start = rewritten_.size();
+            rewritten_ += word;
+            if (hasDecimalComma(word)) rewritten_[rewritten_.find(',', start)] = '.';
+        }
+        line = rewritten_;
+    }
+    expectNumbers(line);
+    return takeNumbers(line);
+}
+
+void TextInterchange::expectNumbers(std::string_view line) {
+    for (std::string_view word; takeWord(line, word);) {
+        if (!isNumber(word)) fail(dataError(), quoted(word) + " is no number");
+        if (!std::isfinite(toFloat(word))) fail(dataError(), quoted(word) + " is not finite");
+    }
+}
+
+RGB TextInterchange::expectNumbersBehind(std::string_view line, std::size_t count) {
+    std::string_view keyword;
+    takeWord(line, keyword);
+    expectNumbers(line);
+    const Tokens words(line);
+    if (words.count() != count) {
+        fail(dataError(), quoted(keyword) + " needs " + std::to_string(count) + " numbers, has " +
+                              std::to_string(words.count()));
+    }
+    return {toFloat(words[0]), toFloat(words[1]), toFloat(words[2])};
+}
+
+void TextInterchange::expectAllSamples(const LUT& lut, LineSource& lines) {
+    if (!isMeant()) return;
+    std::string_view line;
+    const bool hasSurplus = lines.next(line);
+    const std::uint64_t points = pointCount(lut);
+    if (hasSurplus || sampleCount() > points) {
+        fail(dataError(),
+             "there are more samples than the " + std::to_string(points) + " of the table");
+    }
+    if (sampleCount() < points) fail(dataError(), endReason());
+}
+
+void TextInterchange::fail(const char* message, const std::string& reason) {
+    reading_.remarks.addLast(lineNumber(), reason);
+    isExplained_ = true;
+    throw Exception(message);
+}
+
+std::string TextInterchange::endReason() const {
+    const bool hasTable = reading_.table && reading_.table.get() != oldTable_;
+    const std::uint64_t points = hasTable ? pointCount(*reading_.table) : 0;
+    if (points == 0) return "the file ends here";
+    return "the file ends after " + std::to_string(sampleCount()) + " of " +
+           std::to_string(points) + " samples";
+}
+
+void TextInterchange::explain(const char* message) {
+    if (isExplained_) return;
+    std::string reason = reasonOf(message, lastLine_);
+    if (reason.empty() && isAtEnd_) reason = endReason();
+    if (reason.empty() && lastLineNumber_ != lineNumber()) {
+        reason = "what is missing should come before this line of three numbers";
+    }
+    if (reason.empty() && lastLine_.rfind(kByteOrderMark, 0) == 0) {
+        reason = "the file begins with a byte order mark";
+    }
+    if (reason.empty() && lastLine_ == "\r") reason = "the line holds only a carriage return";
+    if (reason.empty() && lastLine_.size() > 1 && lastLine_[0] == '#') {
+        std::string_view rest = lastLine_;
+        std::string_view word;
+        takeWord(rest, word);
+        reason = "the line begins with " + quoted(word) + " and is taken for data";
+    }
+    if (reason.empty()) {
+        reason = "the line has " + std::to_string(countWords(lastLine_)) +
+                 " words: " + quoted(lastLine_);
+    }
+    reading_.remarks.addLast(lineNumber(), reason);
+}
+
+}  // namespace Orlith::LUT
