@@ -65,7 +65,7 @@ TEST_F(ButtonTest, OfTheRealOperatorWritesItsFile) {
     node.setValue("file", folder_.path("pressed.cube"));
     host_.press(node, "generate");
     EXPECT_TRUE(node.takeErrors().empty());
-    EXPECT_EQ(test::readFile(folder_.path("pressed.cube")), test::kIdentityCube);
+    EXPECT_EQ(test::readFile(folder_.path("pressed.cube")), test::identityCube());
     EXPECT_EQ(failureOf([&] { host_.press(node, "file"); }),
               "GenerateLUT1: no button named \"file\"");
     EXPECT_EQ(failureOf([&] { host_.press(node, "none"); }),

@@ -18,7 +18,7 @@ TEST_F(ScriptTest, ConnectsSavedNodesInTheirOrder) {
     EXPECT_EQ(host_.nodes()[1]->name(), "GenerateLUT1");
     host_.nodes()[1]->execute();
     EXPECT_TRUE(host_.nodes()[1]->takeErrors().empty());
-    EXPECT_EQ(test::readFile(out), test::kIdentityCube);
+    EXPECT_EQ(test::readFile(out), test::identityCube());
 }
 
 TEST_F(ScriptTest, SetsValuesInTheOrderOfThePanel) {
