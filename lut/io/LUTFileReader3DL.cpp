@@ -109,7 +109,7 @@ int inputBitsOf(float min, float max) {
 }
 
 /// Deliberate: only a step that grows is refused, one that shrinks passes however much. Held by
-/// ThreeDLReader.RefusesAGridWhoseStepsGrowOnly.
+/// tests/data/read/3dl.txt.
 void expectLinear(const std::vector<float>& values, float tolerance) {
     for (std::size_t i = 2; i < values.size(); ++i) {
         const float step = values[i - 1] - values[i - 2];
@@ -141,7 +141,7 @@ Grid parseGrid(std::string_view line, const Header3DL& header) {
         const auto digits = static_cast<double>(words[0].size() - point - 1);
         tolerance = static_cast<float>(5.0 * std::pow(0.1, digits));
     }
-    // Deliberate: a maximum well below zero passes. Held by ThreeDLReader.ReadsFloatGrids.
+    // Deliberate: a maximum well below zero passes. Held by tests/data/read/3dl.txt.
     if (std::fabs(*max) < 0.000001F) {
         throw Exception("3DL file reader: negative or zero max value");
     }

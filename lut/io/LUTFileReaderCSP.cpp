@@ -39,7 +39,7 @@ constexpr char kNoMoreEntries[] =
 /// This format's lines: trimmed; one that ends in a backslash has the next physical line joined to
 /// it behind a blank.
 /// Deliberate: the backslash stays, as a word or the end of one, and a second one joins nothing.
-/// Held by CSPReader.JoinsALineThatEndsInABackslashOnce.
+/// Held by tests/data/read/csp.txt.
 class ItemSource {
 public:
     ItemSource(std::istream& text, std::uint64_t& lineNumber) : lines_(text, lineNumber) {}
@@ -54,7 +54,7 @@ public:
 
     /// A sample: the first three numbers of a line.
     /// Deliberate: missing ones are 0, so that an empty line is a sample, and whatever follows them
-    /// is ignored. Held by CSPReader.TakesEveryLineForASample.
+    /// is ignored. Held by tests/data/read/csp.txt.
     /// @return false at the end of the file
     bool nextSample(float* sample) {
         std::string_view line;
@@ -153,7 +153,7 @@ Shaper merge(const std::array<std::vector<float>, 3>& rows) {
 
 void readShapers(ItemSource& items, LUT& lut) {
     // Deliberate: without metadata the line in hand is red's count, comment mark or not. Held by
-    // CSPReader.RefusesWhatIsNoTable.
+    // tests/data/read/csp.txt.
     std::string_view countLine = nextFilled(items);
     if (countLine == "BEGIN METADATA") {
         skipMetadata(items);

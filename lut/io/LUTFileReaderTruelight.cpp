@@ -88,7 +88,7 @@ void readInputLUTLength(const Tokens& tokens, Shaper& inputLUT) {
 /// @return false if nothing more is to be read
 bool readKeyword(const Tokens& tokens, LUT& lut, Cube& cube, Data& data) {
     // Deliberate: lines are not trimmed, so a carriage return is part of the keyword that it
-    // follows, which is then unknown. Held by TruelightReader.DoesNotKnowAKeywordWithAReturn.
+    // follows, which is then unknown. Held by tests/data/read/cub.txt.
     const std::string keyword =
         boost::algorithm::to_lower_copy(std::string(tokens[1]), std::locale::classic());
     if (keyword == "width") readWidth(tokens, cube);

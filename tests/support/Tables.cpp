@@ -74,14 +74,4 @@ boost::shared_ptr<ol::LUT> readBytes(const std::string& extension, std::string_v
     return reader->read(folder.write("table", bytes));
 }
 
-void expectRefused(const std::string& extension, const std::string& good,
-                   const std::vector<BadFile>& badFiles) {
-    ASSERT_EQ(messageOf([&] { readBytes(extension, good); }), "(no exception)");
-    for (const BadFile& bad : badFiles) {
-        SCOPED_TRACE(bad.name);
-        const std::string bytes = replaced(good, bad.from, bad.to);
-        EXPECT_EQ(messageOf([&] { readBytes(extension, bytes); }), bad.message);
-    }
-}
-
 }  // namespace test

@@ -39,16 +39,4 @@ std::string messageOf(const std::function<void()>& action);
 boost::shared_ptr<ol::LUT> readBytes(const std::string& extension, std::string_view bytes,
                                      const Reading3DL& reading = {});
 
-/// A wrong file, made from a good one by replacing a piece, and the message that refuses it.
-struct BadFile {
-    const char* name;
-    const char* from;
-    const char* to;
-    const char* message;
-};
-
-/// Expects the good file to be read and each of the bad ones to be refused with its message.
-void expectRefused(const std::string& extension, const std::string& good,
-                   const std::vector<BadFile>& badFiles);
-
 }  // namespace test
