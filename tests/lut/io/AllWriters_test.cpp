@@ -102,51 +102,46 @@ TEST(EveryWriter, ReadsBackWhatItWrote) {
 }
 
 TEST(EveryWriter, RefusesBeforeAFileIsMade) {
+    using LUTs = std::vector<boost::shared_ptr<ol::LUT>>;
+    const LUTs curve = {markedCurve(2)};
+    const LUTs boxes = {withPreLUT(2, 2, 3), withPreLUT(2, 3, 2), withPreLUT(3, 2, 2)};
     constexpr char kLattice[] = "unable to write: must be a 3D lut";
     constexpr char kCube[] = "unable to write: must have the same dimension in r, g and b";
-    constexpr char kCube3DL[] = "unable to write: cube size must be identical in r, g and b";
-    constexpr char kShapers[] =
-        "unable to write: pre-LUT needs at least three entries in both shapers";
     const struct {
         const char* extension;
-        const char* curve;  // null: a curve is written
-        const char* box;    // null: a lattice that is no cube is written
-        boost::shared_ptr<ol::LUT> other;
-        const char* refusal;
+        LUTs luts;
+        const char* message;
     } rows[] = {
-        {".3dl", kLattice, kCube3DL, markedLattice(1, 1, 1),
-         "unable to write: cube size must be at least 2"},
-        {".3dl", kLattice, kCube3DL, markedLattice(66, 66, 66),
-         "unable to write: cube size may be at most 65"},
-        {".blut", "height: not available", kCube, nullptr, nullptr},
-        {".cms", kLattice, kCube, markedLattice(2, 2, 3),
-         "unable to write: expecting pre-LUT data"},
-        {".csp", nullptr, nullptr, curveWithShapers(1, 1), kShapers},
-        {".csp", nullptr, nullptr, curveWithShapers(2, 9), kShapers},
-        {".csp", nullptr, nullptr, curveWithShapers(4, 3), kShapers},
-        {".cub", kLattice, nullptr, nullptr, nullptr},
-        {".cube", nullptr, kCube, nullptr, nullptr},
-        {".vf", kLattice, kCube, nullptr, nullptr},
+        {".3dl", curve, kLattice},
+        {".3dl", boxes, "unable to write: cube size must be identical in r, g and b"},
+        {".3dl", {markedLattice(1, 1, 1)}, "unable to write: cube size must be at least 2"},
+        {".3dl", {markedLattice(66, 66, 66)}, "unable to write: cube size may be at most 65"},
+        {".blut", curve, "height: not available"},
+        {".blut", boxes, kCube},
+        {".cms", curve, kLattice},
+        {".cms", boxes, kCube},
+        {".cms", {markedLattice(2, 2, 3)}, "unable to write: expecting pre-LUT data"},
+        {".csp",
+         {curveWithShapers(1, 1), curveWithShapers(2, 9), curveWithShapers(4, 3)},
+         "unable to write: pre-LUT needs at least three entries in both shapers"},
+        {".cub", curve, kLattice},
+        {".cube", boxes, kCube},
+        {".vf", curve, kLattice},
+        {".vf", boxes, kCube},
     };
+    const TempFolder folder;
+    testing::internal::CaptureStderr();
     for (const auto& row : rows) {
         SCOPED_TRACE(row.extension);
-        const TempFolder folder;
         const auto writer = ol::createWriter("", true, row.extension);
         Writing3DL{"flame"}(*writer);
-        const auto expectRefusal = [&](const boost::shared_ptr<ol::LUT>& lut, const char* text) {
-            if (text == nullptr) return;
-            EXPECT_EQ(messageOf([&] { writer->write(folder.path("no"), lut); }), text);
-            EXPECT_FALSE(std::filesystem::exists(folder.path("no")));
-        };
-        expectRefusal(markedCurve(2), row.curve);
-        for (const auto& lut : {withPreLUT(2, 2, 3), withPreLUT(2, 3, 2), withPreLUT(3, 2, 2)})
-            expectRefusal(lut, row.box);
-        expectRefusal(row.other, row.refusal);
-        testing::internal::CaptureStderr();
+        for (const auto& lut : row.luts)
+            EXPECT_EQ(messageOf([&] { writer->write(folder.path("no"), lut); }), row.message);
+        EXPECT_FALSE(std::filesystem::exists(folder.path("no")));
         EXPECT_EQ(messageOf([&] { writer->write(folder.path("no/no"), withPreLUT(2, 2, 2)); }),
                   "unable to open file for writing");
-        testing::internal::GetCapturedStderr();
     }
+    testing::internal::GetCapturedStderr();
 }
 
 }  // namespace

@@ -22,6 +22,8 @@ TEST(ThreeDLReader, RefusesWithoutItsPropertiesInOrder) {
     EXPECT_EQ(refusal(), "3DL file reader: unable to find output bitdepth to read");
     setProperty<op::Int>(reader, "outputBitDepth", -2);
     EXPECT_EQ(refusal(), "3DL file reader: unable to find normalize property");
+    setProperty<op::Int>(reader, "normalizeOutput", 0);
+    EXPECT_EQ(refusal(), "3DL file reader: unable to open file");
 
     ol::LUTFileReader3DL wordy;
     setProperty<op::String>(wordy, "format3DL", "Lustre");

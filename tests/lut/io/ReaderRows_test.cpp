@@ -5,10 +5,13 @@
 #include <algorithm>
 #include <boost/algorithm/string.hpp>
 #include <iomanip>
+#include <locale>
 #include <sstream>
 #include <stdexcept>
 
+#include "lut/io/Registry.h"
 #include "tests/support/Files.h"
+#include "tests/support/GermanLocale.h"
 #include "tests/support/Tables.h"
 
 namespace {
@@ -18,6 +21,7 @@ using namespace test;
 /// Numbers, in groups.
 std::string textOf(const float* numbers, std::size_t count, std::size_t group = 3) {
     std::ostringstream text;
+    text.imbue(std::locale::classic());
     text << std::setprecision(9);
     for (std::size_t i = 0; i < count; ++i)
         text << (i == 0 ? "" : i % group == 0 ? ", " : " ") << numbers[i];
@@ -53,20 +57,21 @@ std::string textOf(const ol::LUT& lut) {
     return text + textOf(lut.data(), count) + (hasZeros ? ", zeros" : "");
 }
 
-/// What comes of reading bytes: a message or the table, and behind it what was said meanwhile.
-std::string outcomeOf(const std::string& extension, const std::string& bytes,
-                      const Reading3DL& reading) {
+/// What comes of reading bytes: a message or the table, then how much was read and what was said.
+std::string outcomeOf(ol::LUTFileReader& reader, const std::string& bytes) {
+    const TempFolder folder;
     std::string outcome = "std::length_error";
     testing::internal::CaptureStderr();
     try {
         const std::string message =
-            messageOf([&] { outcome = textOf(*readBytes(extension, bytes, reading)); });
+            messageOf([&] { outcome = textOf(*reader.read(folder.write("file", bytes))); });
         if (message != "(no exception)") outcome = message;
     } catch (const std::length_error&) {
     }
-    std::string said = testing::internal::GetCapturedStderr();
-    boost::replace_all(said, "\n", "");
-    return outcome + (said.empty() ? "" : "; ") + said;
+    outcome += " (" + std::to_string(reader.sampleCount()) + " samples in " +
+               std::to_string(reader.lineNumber()) + " lines)";
+    const std::string said = testing::internal::GetCapturedStderr();
+    return outcome + (said.empty() ? "" : " " + boost::trim_right_copy(said));
 }
 
 /// The fields of a row, in which \n, \r, \t, \f, \v and \\ are what they are in C++.
@@ -82,35 +87,52 @@ std::vector<std::string> fieldsOf(std::string row) {
     return fields;
 }
 
-class ReadTest : public testing::TestWithParam<const char*> {};
-
-TEST_P(ReadTest, MakesWhatItsRowsSay) {
-    std::istringstream rows(readFile(dataPath(std::string("read/") + GetParam() + ".txt")));
-    std::string good;
-    Reading3DL reading;
+boost::shared_ptr<ol::LUTFileReader> makeReader(const std::string& format,
+                                                const std::string& options) {
     std::string dialect;
+    Reading3DL reading;
+    std::istringstream(options) >> dialect >> reading.outputBits >> reading.normalizeOutput;
+    reading.format = dialect.c_str();
+    const auto reader = ol::createReader("", true, "." + format);
+    reading(*reader);
+    return reader;
+}
+
+/// Reads what the rows of a format say, with one reader as far as its options allow.
+void expectRows(const std::string& format) {
+    std::istringstream rows(readFile(dataPath("read/" + format + ".txt")));
+    auto reader = makeReader(format, "auto -2 0");
+    std::string good;
     for (std::string row; std::getline(rows, row);) {
         if (row.front() == '#') continue;
         if (row.front() == '!') {
-            std::istringstream(row.substr(1)) >> dialect >> reading.outputBits >>
-                reading.normalizeOutput;
-            reading.format = dialect.c_str();
+            reader = makeReader(format, row.substr(1));
             continue;
         }
         SCOPED_TRACE(row);
         const std::vector<std::string> fields = fieldsOf(row);
         const bool isGood = row.front() == '>';
         ASSERT_EQ(fields.size(), isGood ? 3U : 4U);
-        if (isGood)
-            good = fields[1].front() == '@' ? readFile(dataPath(fields[1].substr(1))) : fields[1];
-        const std::string bytes = isGood ? good : replaced(good, fields[1], fields[2]);
-        std::string outcome = outcomeOf(std::string(".") + GetParam(), bytes, reading);
+        if (isGood) {
+            const bool isFile = boost::starts_with(fields[1], "@");
+            good = isFile ? readFile(dataPath(fields[1].substr(1))) : fields[1];
+        }
+        std::string outcome =
+            outcomeOf(*reader, isGood ? good : replaced(good, fields[1], fields[2]));
         // Of a long table only the beginning is given.
         if (boost::ends_with(fields.back(), "...")) {
             outcome = outcome.substr(0, fields.back().size() - 3) + "...";
         }
         EXPECT_EQ(outcome, fields.back());
     }
+}
+
+class ReadTest : public testing::TestWithParam<const char*> {};
+
+TEST_P(ReadTest, MakesWhatItsRowsSayInEveryLocale) {
+    expectRows(GetParam());
+    const GermanLocale locale;
+    expectRows(GetParam());
 }
 
 INSTANTIATE_TEST_SUITE_P(Formats, ReadTest,
