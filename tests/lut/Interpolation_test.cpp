@@ -192,17 +192,17 @@ TEST(Interpolation, StepsDownAndStopsAtTheFaces) {
 }
 
 TEST(Interpolation, ContinuesTheEdgeBeyondTheLattice) {
-    const auto lut = makeLattice([](const Index& i) {
-        const auto [r, g, b] = i;
-        return ol::RGB(float(r), float(r + 10 * g + 100 * b), float(r * r));
+    const auto lut = randomLattice();
+    forEachIndex({-3, -4, -5}, {6, 7, 8}, [&](const Index& i) {
+        SCOPED_TRACE(testing::PrintToString(i));
+        // A sample, plus at most five slopes of 2, in eight roundings.
+        expectNear(ol::Extrapolate(*lut, i[0], i[1], i[2]),
+                   {continued(*lut, i, 0), continued(*lut, i, 1), continued(*lut, i, 2)},
+                   8 * 11 * kRound);
     });
-    expectRGB(ol::Extrapolate(*lut, -1, 0, 0), -1.0F, -1.0F, -1.0F);
-    expectRGB(ol::Extrapolate(*lut, 4, 3, 4), 4.0F, 434.0F, 10.0F);  // r^2: 4 and twice 4 - 1
-    // Two axes: a third of the red line (-1), two thirds of the green one (-20).
-    EXPECT_NEAR(ol::Extrapolate(*lut, -1, -2, 0)[1], -41.0F / 3.0F, 1e-5F);
-    // Three axes, all above: weights 1/7, 2/7 and 4/7 of 433, 452 and 832.
-    EXPECT_NEAR(ol::Extrapolate(*lut, 3, 5, 8)[1], (433.0F + 2 * 452.0F + 4 * 832.0F) / 7.0F,
-                1e-3F);
+    // A third of the red line (-1), two thirds of the green one (-20),.
+    const auto plane = makeLattice([](const Index& i) { return markedSample(i[0], i[1], i[2]); });
+    EXPECT_NEAR(ol::Extrapolate(*plane, -1, -2, 0)[0], -41.0F / 3.0F / 10000.0F, 1e-8F);
 }
 
 struct Method {

@@ -86,21 +86,6 @@ TEST(TextWriter, WritesTheseBytes) {
     testing::internal::GetCapturedStderr();
 }
 
-TEST(EveryWriter, ReadsBackWhatItWrote) {
-    const TempFolder folder;
-    for (const std::string extension : {".blut", ".cms", ".csp", ".cub", ".cube", ".vf", ".vfz"}) {
-        SCOPED_TRACE(extension);
-        const auto lut =
-            extension == ".csp" || extension == ".cub" ? withPreLUT(3, 5, 4) : withPreLUT(5, 5, 5);
-        const std::string path = folder.path("table" + extension);
-        ol::createWriter(path, false, "")->write(path, lut);
-        const auto back = ol::createReader(path, false, "")->read(path);
-        expectSamplesNear(*back, *lut, extension == ".blut" ? 0.0F : 0.5e-6F + 1e-7F);
-        if (extension == ".cub") expectRGB(back->outputShaper.entries[1], 0.25F, 0.5F, 1.0F);
-        if (extension == ".cms") expectRGB(back->outputShaper.entries[1], 0.05F, 0.1F, 0.2F);
-    }
-}
-
 TEST(EveryWriter, RefusesBeforeAFileIsMade) {
     using LUTs = std::vector<boost::shared_ptr<ol::LUT>>;
     const LUTs curve = {markedCurve(2)};

@@ -92,17 +92,4 @@ TEST(Registry, SplitsAPathAtTheLastDotOfItsName) {
     }
 }
 
-TEST(FileInterfaces, KeepTheFirstPropertyOfAName) {
-    namespace property = Orlith::Property;
-    const auto reader = ol::createReader("look.cube", false, "");
-    const auto writer = ol::createWriter("look.cube", false, "");
-    const auto ten = property::makeProperty<property::Int>("bits", 10);
-    EXPECT_FALSE(reader->getProperty("bits"));
-    EXPECT_TRUE(reader->setProperty("bits", ten));
-    EXPECT_FALSE(reader->setProperty("bits", property::makeProperty<property::Int>("bits", 12)));
-    EXPECT_EQ(reader->getProperty("bits"), ten);
-    EXPECT_TRUE(writer->setProperty("bits", ten));
-    EXPECT_FALSE(writer->setProperty("bits", ten));
-}
-
 }  // namespace
