@@ -233,9 +233,7 @@ TEST_F(GenerateLUTTest, ChoosesTheWriterByTypeAndElseByName) {
     } kCases[] = {
         {"out", ".cube", "TITLE \"Gener"},     {"out.b/../out", ".csp", "CSPLUTV100\n3"},
         {"out.cube", ".csp", "CSPLUTV100\n3"}, {"out.3dl", ".cube", "TITLE \"Gener"},
-        {"out.vf", "", "#Inventor V2"},        {"out.vfz", "", "#Inventor V2"},
-        {"out.blut", ".blut", "HLUT"},         {"out.cub", ".cub", "# Truelight "},
-        {"out.cms", ".cms", "NUCODA_3D_CU"},
+        {"out.vfz", "", "#Inventor V2"},       {"out.cms", ".cms", "NUCODA_3D_CU"},
     };
     std::filesystem::create_directory(folder_.path("out.b"));
     for (const auto& each : kCases) {

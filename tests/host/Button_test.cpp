@@ -81,7 +81,7 @@ TEST_F(ButtonTest, ReadsAndSetsControls) {
                     "node['text'].setValue('\u00e4 b')\n"
                     "assert node['text'].value() == '\u00e4 b'\n"
                     "assert zefra.toNode('Button1')['count'].value() == 7\n"
-                    "assert zefra.toNode('none') is None\n"),
+                    "assert zefra.toNode('none') is None and zefra.toNode('Button') is None\n"),
               "");
     EXPECT_EQ(node_->value("count"), "7");
     EXPECT_EQ(node_->value("on"), "true");

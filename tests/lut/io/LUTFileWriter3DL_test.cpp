@@ -144,12 +144,13 @@ TEST(ThreeDLWriter, RefusesInOrderBeforeAFileIsMade) {
                   "3DL file reader: invalid 3DL format specified for writing");
     }
     setProperty<op::String>(writer, "format3DL", "lustre");
-    EXPECT_EQ(refusal(lattice), "unable to find input bitdepth to write");
-    setProperty<op::Int>(writer, "inputBitDepth", 10);
-    EXPECT_EQ(refusal(lattice), "unable to find output bitdepth to write");
-    setProperty<op::Int>(writer, "outputBitDepth", 10);
-    EXPECT_EQ(refusal(lattice), "unable to find clamp property");
-    setProperty<op::Int>(writer, "clampOutput", 1);
+    const char* const steps[][2] = {{"inputBitDepth", "unable to find input bitdepth to write"},
+                                    {"outputBitDepth", "unable to find output bitdepth to write"},
+                                    {"clampOutput", "unable to find clamp property"}};
+    for (const auto& [name, message] : steps) {
+        EXPECT_EQ(refusal(lattice), message);
+        setProperty<op::Int>(writer, name, 10);
+    }
     testing::internal::CaptureStderr();
     EXPECT_EQ(refusal(lattice), "Lustre 3DL cube resolution must be a power of two (plus one)");
     EXPECT_EQ(testing::internal::GetCapturedStderr(),
