@@ -93,7 +93,7 @@ boost::shared_ptr<ol::LUTFileReader> makeReader(const std::string& format,
     Reading3DL reading;
     std::istringstream(options) >> dialect >> reading.outputBits >> reading.normalizeOutput;
     reading.format = dialect.c_str();
-    const auto reader = ol::createReader("", true, "." + format);
+    auto reader = ol::createReader("", true, "." + format);
     reading(*reader);
     return reader;
 }
