@@ -118,7 +118,7 @@ struct GridNumbers {
 /// Walks the grid's line, which may hold millions of numbers, and keeps none of them.
 /// @param line       not empty
 /// @param tolerance  by how much a step may exceed the one before. Deliberate: one that shrinks
-///                   passes however much. Held by ThreeDLReader.RefusesAGridWhoseStepsGrowOnly.
+///                   passes however much. Held by tests/data/read/3dl.txt.
 GridNumbers walkGrid(std::string_view line, float tolerance) {
     std::string_view word;
     takeWord(line, word);
@@ -157,7 +157,7 @@ Grid parseGrid(std::string_view line, const Header3DL& header) {
         grid.origin = min;
         grid.range = max - min;
     }
-    // Deliberate: a maximum well below zero passes. Held by ThreeDLReader.ReadsFloatGrids.
+    // Deliberate: a maximum well below zero passes. Held by tests/data/read/3dl.txt.
     if (std::fabs(max) < 0.000001F) {
         throw Exception("3DL file reader: negative or zero max value");
     }

@@ -105,7 +105,7 @@ void readPreLUT(LineSource& lines, Line& line, int entryCount, Shaper& shaper) {
     for (int entry = 1; entry < entryCount; ++entry) {
         if (!line.next(lines)) throw Exception("CMS LUT reader: expecting more pre-LUT data.");
         // Deliberate: the message of the lattice from the second entry on, for comments as well;
-        // callers may know it. Held by CMSReader.RefusesWhatIsNoTable.
+        // callers may know it. Held by tests/data/read/cms.txt.
         entries.push_back(line.expectTriple(kDataError));
     }
     entries.moveTo(shaper);
@@ -122,7 +122,7 @@ void storeSample(LUT& lut, int size, LatticePosition& point, const RGB& rgb) {
 }
 
 /// Deliberate: by N, not by N - 1, and on reading only, so that a file keeps its meaning; writing
-/// a table and reading it back divides its pre-LUT. Held by CMSReader.DividesThePreLUTByThePoints.
+/// a table and reading it back divides its pre-LUT. Held by tests/data/read/cms.txt.
 void scalePreLUT(Shaper& shaper, int size) {
     for (RGB& entry : shaper.entries) {
         for (unsigned c = 0; c < 3; ++c)

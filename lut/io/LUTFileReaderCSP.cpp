@@ -39,7 +39,7 @@ constexpr char kNoMoreEntries[] =
 /// This format's lines: trimmed; to one that ends in a backslash the next physical line is joined,
 /// with a blank between them.
 /// Deliberate: the backslash stays, as a word or the end of one, and a second one joins nothing.
-/// Held by CSPReader.JoinsALineThatEndsInABackslashOnce.
+/// Held by tests/data/read/csp.txt.
 class ItemSource {
 public:
     ItemSource(std::istream& text, std::uint64_t& lineNumber) : lines_(text, lineNumber) {}
@@ -60,7 +60,7 @@ public:
 
     /// A sample: the first three numbers of a line.
     /// Deliberate: missing ones are 0, so that an empty line is a sample, and whatever follows them
-    /// is ignored. Held by CSPReader.TakesEveryLineForASample.
+    /// is ignored. Held by tests/data/read/csp.txt.
     /// @return false at the end of the file
     bool nextSample(float* sample) {
         std::string_view line;
@@ -166,7 +166,7 @@ void finish(ShaperEntries& entries, const std::array<int, 3>& pointCounts, Shape
 
 void readShapers(ItemSource& items, LUT& lut) {
     // Deliberate: without metadata the line in hand is red's count, comment mark or not. Held by
-    // CSPReader.RefusesWhatIsNoTable.
+    // tests/data/read/csp.txt.
     std::string_view countLine = nextFilled(items);
     if (countLine == "BEGIN METADATA") {
         skipMetadata(items);

@@ -88,7 +88,7 @@ void readInputLUTLength(const Tokens& tokens, Shaper& inputLUT) {
 /// @return false if nothing more is to be read
 bool readKeyword(const Tokens& tokens, LUT& lut, Cube& cube, Data& data) {
     // Deliberate: lines are not trimmed, so a carriage return is part of the keyword that it
-    // follows, which is then unknown. Held by TruelightReader.DoesNotKnowAKeywordWithAReturn.
+    // follows, which is then unknown. Held by tests/data/read/cub.txt.
     const auto isKeyword = [&](const char* keyword) {
         return boost::algorithm::iequals(tokens[1], keyword, std::locale::classic());
     };

@@ -54,7 +54,7 @@ void writeShapers(LineWriter& file, const LUT& lut) {
         file.integer(static_cast<int>(pointCount)).endLine();
         // Deliberate: channel c is the run of floats from 3 c on, not every third float from c on.
         // Files stay byte for byte what they always were; a shaper that is not the same run on all
-        // channels does not come back. Held by CSPWriter.CutsShapersFromTheFlatRun.
+        // channels does not come back. Held by TextWriter.WritesTheseBytes.
         writeRow(file, inputs + 3 * c, pointCount);
         writeRow(file, outputs + 3 * c, pointCount);
     }

@@ -65,7 +65,7 @@ TEST_F(ButtonTest, OfTheRealOperatorWritesItsFile) {
     node.setValue("file", folder_.path("pressed.cube"));
     host_.press(node, "generate");
     EXPECT_TRUE(node.takeErrors().empty());
-    EXPECT_EQ(test::readFile(folder_.path("pressed.cube")), test::kIdentityCube);
+    EXPECT_EQ(test::readFile(folder_.path("pressed.cube")), test::identityCube());
     EXPECT_EQ(failureOf([&] { host_.press(node, "file"); }),
               "GenerateLUT1: no button named \"file\"");
     EXPECT_EQ(failureOf([&] { host_.press(node, "none"); }),
@@ -81,7 +81,7 @@ TEST_F(ButtonTest, ReadsAndSetsControls) {
                     "node['text'].setValue('\u00e4 b')\n"
                     "assert node['text'].value() == '\u00e4 b'\n"
                     "assert zefra.toNode('Button1')['count'].value() == 7\n"
-                    "assert zefra.toNode('none') is None\n"),
+                    "assert zefra.toNode('none') is None and zefra.toNode('Button') is None\n"),
               "");
     EXPECT_EQ(node_->value("count"), "7");
     EXPECT_EQ(node_->value("on"), "true");

@@ -1,9 +1,7 @@
 #include "lut/LUT.h"
 
 #include <gtest/gtest.h>
-#include <unistd.h>
 
-#include <fstream>
 #include <limits>
 #include <stdexcept>
 
@@ -23,14 +21,6 @@ public:
     }
 };
 
-/// Memory of this process that is really there.
-std::size_t residentBytes() {
-    std::size_t total = 0;
-    std::size_t residentPages = 0;
-    std::ifstream("/proc/self/statm") >> total >> residentPages;
-    return residentPages * static_cast<std::size_t>(sysconf(_SC_PAGESIZE));
-}
-
 TEST(LUT, RefusesWhatAKindDoesNotHave) {
     BareLUT bare;
     ol::LUT1D curve;
@@ -42,61 +32,41 @@ TEST(LUT, RefusesWhatAKindDoesNotHave) {
     ol::RGB max;
     const struct {
         const char* message;
-        std::function<void()> action;
+        std::vector<std::function<void()>> actions;
     } refusals[] = {
-        {"width: not available", [&] { bare.width(); }},
-        {"height: not available", [&] { bare.height(); }},
-        {"depth: not available", [&] { bare.depth(); }},
-        {"resize: not available", [&] { bare.resize(2); }},
-        {"resize: not available", [&] { bare.resize(2, 2, 2); }},
-        {"get: not available", [&] { bare.get(0); }},
-        {"get: not available", [&] { bare.get(0, 0, 0); }},
-        {"get: not available", [&] { constBare.get(0); }},
-        {"get: not available", [&] { constBare.get(0, 0, 0); }},
-        {"minmax: not available", [&] { bare.minmax(min, max); }},
-        {"height: not available", [&] { curve.height(); }},
-        {"depth: not available", [&] { curve.depth(); }},
-        {"resize: not available", [&] { curve.resize(2, 2, 2); }},
-        {"get: not available", [&] { curve.get(0, 0, 0); }},
-        {"get: not available", [&] { constCurve.get(0, 0, 0); }},
-        {"get: not available", [&] { lattice.get(0); }},
-        {"get: not available", [&] { constLattice.get(0); }},
+        {"width: not available", {[&] { bare.width(); }}},
+        {"height: not available", {[&] { bare.height(); }, [&] { curve.height(); }}},
+        {"depth: not available", {[&] { bare.depth(); }, [&] { curve.depth(); }}},
+        {"minmax: not available", {[&] { bare.minmax(min, max); }}},
+        {"resize: not available",
+         {[&] { bare.resize(2); }, [&] { bare.resize(2, 2, 2); }, [&] { curve.resize(2, 2, 2); }}},
+        {"get: not available",
+         {[&] { bare.get(0); }, [&] { bare.get(0, 0, 0); }, [&] { constBare.get(0); },
+          [&] { constBare.get(0, 0, 0); }, [&] { curve.get(0, 0, 0); },
+          [&] { constCurve.get(0, 0, 0); }, [&] { lattice.get(0); }, [&] { constLattice.get(0); }}},
     };
-    for (const auto& [message, action] : refusals)
-        EXPECT_EQ(messageOf(action), message);
+    for (const auto& [message, actions] : refusals) {
+        for (const auto& action : actions)
+            EXPECT_EQ(messageOf(action), message);
+    }
 }
 
-TEST(LUT, StartsEmptyWithTheIdentityDomain) {
-    const ol::LUT3D lattice;
-    EXPECT_EQ(lattice.width(), 0);
-    EXPECT_EQ(lattice.height(), 0);
-    EXPECT_EQ(lattice.depth(), 0);
-    EXPECT_EQ(lattice.data(), nullptr);
-    EXPECT_EQ(lattice.dataSize(), 0U);
-    EXPECT_TRUE(lattice.inputShaper.empty());
-    EXPECT_TRUE(lattice.outputShaper.empty());
-    EXPECT_TRUE(lattice.transform.is_identity());
-    EXPECT_FALSE(lattice.is1D());
-    const ol::LUT1D curve;
-    EXPECT_EQ(curve.width(), 0);
-    EXPECT_EQ(curve.data(), nullptr);
-    EXPECT_TRUE(curve.is1D());
-}
+TEST(LUT, StartsEmptyAndStoresRedFastestAsPlainFloats) {
+    ol::LUT3D cube;
+    EXPECT_EQ(cube.depth(), 0);
+    EXPECT_EQ(cube.data(), nullptr);
+    EXPECT_TRUE(cube.transform.is_identity());
+    EXPECT_FALSE(cube.is1D());
+    EXPECT_TRUE(ol::LUT1D().is1D());
+    cube.resize(33);
+    EXPECT_EQ(cube.height(), 33);
+    EXPECT_EQ(cube.dataSize(), 431244U);
 
-TEST(LUT, StoresRedFastestAsPlainFloats) {
     const auto lut = markedLattice(2, 3, 4);
-    EXPECT_EQ(&lut->get(1, 0, 0) - &lut->get(0, 0, 0), 1);
     EXPECT_EQ(&lut->get(0, 1, 0) - &lut->get(0, 0, 0), 2);
     EXPECT_EQ(&lut->get(0, 0, 1) - &lut->get(0, 0, 0), 6);
     const float* last = lut->data() + std::size_t{3} * 23;
     expectRGB(ol::RGB(last[0], last[1], last[2]), markedSample(1, 2, 3));
-
-    ol::LUT3D cube;
-    cube.resize(33);
-    EXPECT_EQ(cube.width(), 33);
-    EXPECT_EQ(cube.height(), 33);
-    EXPECT_EQ(cube.depth(), 33);
-    EXPECT_EQ(cube.dataSize(), 431244U);
 }
 
 TEST(LUT, ShowsADerivedLatticeEveryResize) {
@@ -139,15 +109,13 @@ TEST(LUT, KeepsSamplesInStorageAndAddsZeros) {
 TEST(LUT, RefusesSizesThatCannotBeNumberedAndStaysAsItWas) {
     constexpr int kMost = std::numeric_limits<int>::max();
     const auto lut = markedLattice(2, 3, 4);
-    const int sizes[][3] = {
-        {-1, 2, 2}, {2, -1, 2},         {2, 2, -1},        {-2, -2, 2},           {0, -1, 2},
-        {2, 0, -1}, {1291, 1291, 1291}, {65536, 32768, 1}, {kMost, kMost, kMost}, {2, kMost, 1}};
+    const int sizes[][3] = {{-1, 2, 2},         {2, -1, 2},           {2, 2, -1},
+                            {-2, -2, 2},        {0, -1, 2},           {2, 0, -1},
+                            {1291, 1291, 1291}, {65536, 32768, 1},    {32768, 256, 256},
+                            {2, kMost, 1},      {kMost, kMost, kMost}};
     for (const auto& [width, height, depth] : sizes) {
         SCOPED_TRACE(std::to_string(width) + " " + std::to_string(height));
         EXPECT_THROW(lut->resize(width, height, depth), std::length_error);
-        EXPECT_EQ(lut->width(), 2);
-        EXPECT_EQ(lut->height(), 3);
-        EXPECT_EQ(lut->depth(), 4);
         expectSamplesNear(*lut, *markedLattice(2, 3, 4), 0.0F);
     }
     const auto curve = markedCurve(3);
@@ -157,22 +125,6 @@ TEST(LUT, RefusesSizesThatCannotBeNumberedAndStaysAsItWas) {
 
     lut->resize(0, kMost, kMost);  // nothing to number
     EXPECT_EQ(lut->data(), nullptr);
-}
-
-TEST(LUT, CostsNoMemoryForSamplesThatNobodyStored) {
-    constexpr std::size_t kAllowance = std::size_t{64} << 20;
-    const std::size_t before = residentBytes();
-    ASSERT_GT(before, 0U);
-    ol::LUT3D lut;
-    lut.resize(500);  // 1.5 GB of address space
-    EXPECT_LT(residentBytes(), before + kAllowance);
-    lut.resize(501);
-    EXPECT_LT(residentBytes(), before + kAllowance);
-    lut.get(250, 250, 250) = ol::RGB(1.0F, 2.0F, 3.0F);
-    const auto element = &lut.get(250, 250, 250) - &lut.get(0, 0, 0);
-    lut.resize(500);
-    EXPECT_LT(residentBytes(), before + kAllowance);
-    expectRGB(*(&lut.get(0, 0, 0) + element), 1.0F, 2.0F, 3.0F);
 }
 
 TEST(LUT, ClearsWhatAShrunkTableLeftBehind) {
@@ -197,19 +149,14 @@ TEST(LUT, TellsItsDomain) {
     ol::LUT3D lattice;
     lattice.resize(2, 3, 5);
     lattice.minmax(min, max);
-    expectRGB(min, 0.0F, 0.0F, 0.0F);
     expectRGB(max, 1.0F, 2.0F, 4.0F);
-
     ol::setUnitDomain(lattice, 2, 3, 5);
-    EXPECT_EQ(lattice.transform[0][0], 1.0F);
-    EXPECT_EQ(lattice.transform[1][1], 0.5F);
-    EXPECT_EQ(lattice.transform[2][2], 0.25F);
-    EXPECT_EQ(lattice.transform[3][3], 1.0F);
+    const float unit[] = {1, 0, 0, 0, 0, 0.5F, 0, 0, 0, 0, 0.25F, 0, 0, 0, 0, 1};
+    EXPECT_EQ(lattice.transform, ol::Transform(unit));
     lattice.transform[3][1] = -3.0F;
     lattice.minmax(min, max);
     expectRGB(min, 0.0F, -3.0F, 0.0F);
     expectRGB(max, 1.0F, -2.0F, 1.0F);
-
     ol::LUT1D curve;
     curve.resize(17);
     curve.minmax(min, max);
@@ -221,19 +168,15 @@ TEST(FloatToInt, CutsTowardsZeroAndSaturates) {
     constexpr int kMost = std::numeric_limits<int>::max();
     constexpr int kLeast = std::numeric_limits<int>::min();
     constexpr double kInfinity = std::numeric_limits<double>::infinity();
-    const struct {
-        double value;
-        int expected;
-    } rows[] = {{1.99, 1},
-                {-1.99, -1},
-                {2147483647.5, kMost},
-                {2147483648.0, kMost},
-                {-2147483648.0, kLeast},
-                {-2147483648.9, kLeast},
-                {-2147483649.0, kLeast},
-                {kInfinity, kMost},
-                {-kInfinity, kLeast},
-                {std::numeric_limits<double>::quiet_NaN(), 0}};
+    const std::pair<double, int> rows[] = {{1.99, 1},
+                                           {-1.99, -1},
+                                           {2147483647.5, kMost},
+                                           {2147483648.0, kMost},
+                                           {kInfinity, kMost},
+                                           {-2147483648.9, kLeast},
+                                           {-2147483649.0, kLeast},
+                                           {-kInfinity, kLeast},
+                                           {std::numeric_limits<double>::quiet_NaN(), 0}};
     for (const auto& [value, expected] : rows) {
         EXPECT_EQ(ol::toInt32(value), expected) << value;
         if (expected == kMost || expected == kLeast || expected == 0) {

@@ -28,14 +28,14 @@ Program::Program(const std::string& folder, const std::string& command, const st
     std::vector<char*> argv(words.size() + 1);  // ended by a null pointer
     std::transform(words.begin(), words.end(), argv.begin(),
                    [](std::string& word) { return word.data(); });
-    const std::string streams[] = {streams_.write("in", input), streams_.path("out"),
-                                   streams_.path("err")};
+    const std::string streams[] = {streams_.write("in", input), streams_.write("out", ""),
+                                   streams_.write("err", "")};
 
     process_ = fork();
     if (process_ < 0) throw std::runtime_error("no process");
     if (process_ > 0) return;
     for (int stream = 0; stream < 3; ++stream) {
-        const int flags = stream == 0 ? O_RDONLY : O_WRONLY | O_CREAT | O_TRUNC;
+        const int flags = stream == 0 ? O_RDONLY : O_WRONLY;
         const int file = open(streams[stream].c_str(), flags, 0600);
         if (file < 0 || dup2(file, stream) < 0) _exit(kExecFailed);
     }

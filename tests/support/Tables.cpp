@@ -3,8 +3,6 @@
 #include <gtest/gtest.h>
 
 #include <boost/smart_ptr/make_shared.hpp>
-#include <cmath>
-#include <stdexcept>
 
 #include "lut/Exception.h"
 #include "lut/io/Registry.h"
@@ -12,18 +10,18 @@
 
 namespace test {
 
-ol::RGB markedSample(int r, int g, int b) {
+ol::RGB markedSample(int r, int g, int b, float divisor) {
     const auto place = static_cast<float>(r + 10 * g + 100 * b);
-    return {place / 10000.0F, (place + 1000.0F) / 10000.0F, (place + 2000.0F) / 10000.0F};
+    return {place / divisor, (place + 1000.0F) / divisor, (place + 2000.0F) / divisor};
 }
 
-boost::shared_ptr<ol::LUT3D> markedLattice(int width, int height, int depth) {
+boost::shared_ptr<ol::LUT3D> markedLattice(int width, int height, int depth, float divisor) {
     auto lut = boost::make_shared<ol::LUT3D>();
     lut->resize(width, height, depth);
     for (int b = 0; b < depth; ++b) {
         for (int g = 0; g < height; ++g) {
             for (int r = 0; r < width; ++r)
-                lut->get(r, g, b) = markedSample(r, g, b);
+                lut->get(r, g, b) = markedSample(r, g, b, divisor);
         }
     }
     return lut;
@@ -69,37 +67,11 @@ std::string messageOf(const std::function<void()>& action) {
 }
 
 boost::shared_ptr<ol::LUT> readBytes(const std::string& extension, std::string_view bytes,
-                                     const Prepare& prepare) {
+                                     const Reading3DL& reading) {
     const TempFolder folder;
     const auto reader = ol::createReader("", true, extension);
-    prepare(*reader);
+    reading(*reader);
     return reader->read(folder.write("table", bytes));
-}
-
-void expectRefused(const std::string& extension, const std::string& good,
-                   const std::vector<BadFile>& badFiles, const Prepare& prepare) {
-    ASSERT_EQ(messageOf([&] { readBytes(extension, good, prepare); }), "(no exception)");
-    for (const BadFile& bad : badFiles) {
-        SCOPED_TRACE(bad.name);
-        const std::string bytes = replaced(good, bad.from, bad.to);
-        EXPECT_EQ(messageOf([&] { readBytes(extension, bytes, prepare); }), bad.message);
-    }
-}
-
-void expectTruncationsAreSafe(const std::string& extension, const std::string& bytes,
-                              const Prepare& prepare) {
-    const TempFolder folder;
-    const auto reader = ol::createReader("", true, extension);
-    prepare(*reader);
-    for (std::size_t byteCount = 0; byteCount < bytes.size(); ++byteCount) {
-        const std::string file = folder.write("cut", std::string_view(bytes).substr(0, byteCount));
-        try {
-            EXPECT_TRUE(reader->read(file)) << "cut to " << byteCount << " bytes";
-        } catch (const ol::Exception& exception) {
-            EXPECT_STRNE(exception.message(), "") << "cut to " << byteCount << " bytes";
-        } catch (const std::length_error&) {
-        }
-    }
 }
 
 }  // namespace test

@@ -8,21 +8,22 @@
 
 #include "lut/LUT1D.h"
 #include "lut/LUT3D.h"
-#include "lut/io/LUTFileReader.h"
+#include "tests/support/ThreeDL.h"
 
 namespace test {
 
 namespace ol = Orlith::LUT;
 
-/// A lattice whose every float tells its place and channel: (r + 10 g + 100 b + 1000 c) / 10000, so
-/// that no swapped axis, transposed loop or exchanged channel goes unseen.
-boost::shared_ptr<ol::LUT3D> markedLattice(int width, int height, int depth);
+/// A lattice whose every float tells its place and channel, (r + 10 g + 100 b + 1000 c) / divisor,
+/// so that no swapped axis, transposed loop or exchanged channel goes unseen.
+boost::shared_ptr<ol::LUT3D> markedLattice(int width, int height, int depth,
+                                           float divisor = 10000.0F);
 
 /// A curve of the same kind: (i + 1000 c) / 10000.
 boost::shared_ptr<ol::LUT1D> markedCurve(int sampleCount);
 
 /// What markedLattice holds at a point.
-ol::RGB markedSample(int r, int g, int b);
+ol::RGB markedSample(int r, int g, int b, float divisor = 10000.0F);
 
 /// Expects the floats of a triple, bit for bit.
 void expectRGB(const ol::RGB& actual, float r, float g, float b);
@@ -34,30 +35,8 @@ void expectSamplesNear(const ol::LUT& actual, const ol::LUT& expected, float tol
 /// The message of the Exception that an action throws; "(no exception)" if it throws none.
 std::string messageOf(const std::function<void()>& action);
 
-/// Gives a reader the properties that its format needs.
-using Prepare = std::function<void(ol::LUTFileReader&)>;
-inline void asItIs(ol::LUTFileReader&) {}
-
-/// Reads bytes with the reader of an extension.
+/// Reads bytes with the reader of an extension; formats other than .3dl do not look at its options.
 boost::shared_ptr<ol::LUT> readBytes(const std::string& extension, std::string_view bytes,
-                                     const Prepare& prepare = asItIs);
-
-/// A wrong file, made from a good one by replacing a piece, and the message that refuses it.
-struct BadFile {
-    const char* name;
-    const char* from;
-    const char* to;
-    const char* message;
-};
-
-/// Expects the good file to be read and each of the bad ones to be refused with its message.
-void expectRefused(const std::string& extension, const std::string& good,
-                   const std::vector<BadFile>& badFiles, const Prepare& prepare = asItIs);
-
-/// Reads every truncation of a file's bytes, each from a file of just that size. Each has to give a
-/// table, an Exception or the standard library's length error; under the address sanitizer, without
-/// reading or writing outside an array.
-void expectTruncationsAreSafe(const std::string& extension, const std::string& bytes,
-                              const Prepare& prepare = asItIs);
+                                     const Reading3DL& reading = {});
 
 }  // namespace test

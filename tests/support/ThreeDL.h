@@ -1,8 +1,5 @@
 #pragma once
 
-#include <boost/smart_ptr/make_shared.hpp>
-#include <string>
-
 #include "lut/io/LUTFileReader.h"
 #include "lut/io/LUTFileWriter.h"
 #include "lut/property/PropertySet.h"
@@ -28,7 +25,7 @@ struct Reading3DL {
     }
 };
 
-/// What a .3dl writer has to be told.
+/// What a .3dl writer has to be told. Scratch's codes are scaled and offset, as its programs do.
 struct Writing3DL {
     const char* format = nullptr;
     int inputBits = 10;
@@ -40,6 +37,9 @@ struct Writing3DL {
         setProperty<Orlith::Property::Int>(writer, "inputBitDepth", inputBits);
         setProperty<Orlith::Property::Int>(writer, "outputBitDepth", outputBits);
         setProperty<Orlith::Property::Int>(writer, "clampOutput", clampOutput);
+        if (std::string_view(format) != "scratch") return;
+        setProperty<Orlith::Property::Double>(writer, "scale", 0.9797979593276978);  // 97/99
+        setProperty<Orlith::Property::Double>(writer, "offset", 15.0);
     }
 };
 

@@ -52,14 +52,4 @@ TEST(LineWriter, HandsOverLinesOrBlocks) {
     EXPECT_GT(readFile(folder.path("blocks")).size(), 250000U);
 }
 
-TEST(LineWriter, EmptiesTheFileOrSaysThatItCannot) {
-    const TempFolder folder;
-    const std::string path = folder.write("old", "old text");
-    bool wroteAll = false;
-    { const ol::LineWriter file(path, true, wroteAll); }
-    EXPECT_EQ(readFile(path), "");
-    EXPECT_EQ(messageOf([&] { ol::LineWriter(folder.path("none/file"), true, wroteAll); }),
-              "unable to open file for writing");
-}
-
 }  // namespace
