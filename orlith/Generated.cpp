@@ -1,5 +1,13 @@
 #include "orlith/Generated.h"
 
+#include <fmt/format.h>
+
+#include <algorithm>
+#include <boost/smart_ptr/make_shared.hpp>
+
+#include "lut/LUT3D.h"
+#include "orlith/Look.h"
+#include "orlith/Messages.h"
 #include "orlith/PatternTable.h"
 #include "orlith/TableFile.h"
 #include "orlith/Verification.h"
@@ -34,6 +42,33 @@ void addPreLUT(Orlith::LUT::LUT& lut, const host::Node& node) {
     setPreLUT(lut, entryCount->number(), node.value("style1d"));
 }
 
+/// Warns where the operator's file does not have the pattern's look for those who read it: its
+/// pre-LUT from 0 to 1 reaches the first cell only where a format wants lattice units.
+void warnOfOtherLook(const Generated& file, const std::string& extension,
+                     const boost::shared_ptr<Orlith::LUT::LUT3D>& table) {
+    if (extension != ".cub" && extension != ".cms") return;
+    ReadOptions reading;
+    reading.from = extension;
+    const Table back = readTable(file.path, reading, file.name);
+    const Orlith::LUT::Evaluator read(back.lut);
+    // What the pattern stands for: its colours as they are, without the pre-LUT.
+    const auto look = boost::make_shared<Orlith::LUT::LUT3D>();
+    look->resize(table->width(), table->height(), table->depth());
+    std::copy_n(table->data(), 3 * pointCount(*table), look->data());
+    Orlith::LUT::setUnitDomain(*look, look->width(), look->height(), look->depth());
+    const Orlith::LUT::Evaluator meant(look);
+    LookComparison comparison(read, meant);
+    forEachInput(*look, false, [&](const auto& colour) { comparison.add(colour); });
+    const double deviation = largestOf(comparison.finish());
+    constexpr double kFormatPrecision = 1e-5;
+    if (!(deviation > kFormatPrecision)) return;
+    warn(fmt::format(
+        "{}: programs that read {} files see a look that is off by {:.2g}: the operator's pre-LUT"
+        " from 0 to 1 reaches the first cell of the lattice only; write a .cube file and \"orlith"
+        " convert\" that to {}",
+        file.name, extension, deviation, extension));
+}
+
 }  // namespace
 
 std::string formatWritten(const host::Node& node, const std::string& name) {
@@ -44,14 +79,15 @@ std::string formatWritten(const host::Node& node, const std::string& name) {
 std::string reportGenerated(host::Node& node, const Generated& file) {
     const std::string extension = formatWritten(node, file.name);
     const auto table = tableOfPattern(node.image()->input(0));
-    addPreLUT(*table, node);
-    Verification verification;
-    verification.reason = file.whyNotReadBack;
-    if (verification.reason.empty()) {
-        const Options3DL options3DL = extension == ".3dl" ? options3DLOf(node) : Options3DL();
-        verification = verify(file.path, file.name, extension, *table, options3DL);
+    if (!file.whyNotReadBack.empty()) {
+        return summary(file.name, extension, *table, "not verified: " + file.whyNotReadBack);
     }
-    return summary(file.name, extension, *table, verification);
+    addPreLUT(*table, node);
+    const Options3DL options3DL = extension == ".3dl" ? options3DLOf(node) : Options3DL();
+    const double deviation = verify(file.path, file.name, extension, *table, options3DL);
+    warnOfOtherLook(file, extension, table);
+    return summary(file.name, extension, *table,
+                   fmt::format("largest deviation {:.2g}", deviation));
 }
 
 }  // namespace orlith

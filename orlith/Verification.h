@@ -3,34 +3,34 @@
 #include <string>
 
 #include "lut/LUT.h"
+#include "orlith/TableFile.h"
 #include "orlith/WriteOptions.h"
 
 namespace orlith {
-
-/// What reading a written file back showed.
-struct Verification {
-    bool isVerified = false;
-    std::string reason;             ///< why it was not
-    double largestDeviation = 0.0;  ///< of a sample from the table, in the table's units
-};
 
 /// Why a file of a table, which the format's writer takes, could not be read again; empty if it
 /// can.
 std::string whyUnreadable(const std::string& extension, const Orlith::LUT::LUT& table);
 
-/// Reads a file back with the library's own reader and compares it with the table that was written,
-/// within the precision of the format.
+/// How to read a file that was written with these options.
+ReadOptions readingOf(const std::string& extension, const Options3DL& options);
+
+/// Reads a file back by the book with the library's own reader and compares it with the table that
+/// was written, within the precision of the format.
 ///
 /// @param path       where the file is now
 /// @param name       what people call it
 /// @param extension  the format that was written
 /// @param options    what a .3dl file was written with
+/// @param isByBook   whether the file's pre-LUT was written by the book too
+/// @return           the largest deviation of a sample from the table, in the table's units
 /// @throws Failure   the file cannot be read or differs; the text says where
-Verification verify(const std::string& path, const std::string& name, const std::string& extension,
-                    const Orlith::LUT::LUT& table, const Options3DL& options);
+double verify(const std::string& path, const std::string& name, const std::string& extension,
+              const Orlith::LUT::LUT& table, const Options3DL& options, bool isByBook = true);
 
 /// The line that says what was written.
+/// @param outcome  of its verification
 std::string summary(const std::string& name, const std::string& extension,
-                    const Orlith::LUT::LUT& table, const Verification& verification);
+                    const Orlith::LUT::LUT& table, const std::string& outcome);
 
 }  // namespace orlith

@@ -89,7 +89,7 @@ void setWriterProperties(ol::LUTFileWriter& writer, const Options3DL& options) {
 }
 
 void addPreLUT(ol::LUT& lut, const WriteOptions& options) {
-    if (!options.lut1d && !options.style1d) return;
+    if (!options.hasPreLUT()) return;
     if (!lut.inputShaper.empty() || !lut.outputShaper.empty()) return;
     setPreLUT(lut, options.lut1d.value_or(kDefaultPreLUTEntries),
               options.style1d.value_or("logarithmic"));

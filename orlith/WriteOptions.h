@@ -31,6 +31,9 @@ struct WriteOptions {
     std::optional<int> lut1d;
     std::optional<std::string> style1d;
 
+    /// Whether a pre-LUT is asked for, for a table that has none.
+    bool hasPreLUT() const { return lut1d || style1d; }
+
     /// Scale and offset as the dialect brings them, unless they are given.
     Options3DL options3DL() const;
 };

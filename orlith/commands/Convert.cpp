@@ -6,7 +6,10 @@
 #include "lut/Exception.h"
 #include "lut/io/Registry.h"
 #include "orlith/Command.h"
+#include "orlith/Fitting.h"
+#include "orlith/Look.h"
 #include "orlith/Messages.h"
+#include "orlith/Options.h"
 #include "orlith/OutputFile.h"
 #include "orlith/TableFile.h"
 #include "orlith/Verification.h"
@@ -21,29 +24,15 @@ struct ConvertOptions {
     std::string input;
     std::string output;
     std::string to;
+    int size = 0;  // 0: the table's own
     ReadOptions reading;
     WriteOptions writing;
     bool skipsVerification = false;
     bool isQuiet = false;
 };
 
-/// Whether the domain is the one that a reader of the format gives to its tables.
-bool keepsDomain(const ol::LUT& lut, const std::string& extension) {
-    if (lut.is1D()) return true;
-    if (extension == ".cub" && !lut.outputShaper.empty()) return true;
-    const bool isVectorField = extension == ".vf" || extension == ".vfz" || extension == ".gz";
-    const int sizes[] = {lut.width(), lut.height(), lut.depth()};
-    for (unsigned c = 0; c < 3; ++c) {
-        const float cells = static_cast<float>(isVectorField ? sizes[c] : sizes[c] - 1);
-        const float reach = lut.transform[c][c] * cells;
-        if (!(std::fabs(reach - 1.0F) < 1e-4F) || lut.transform[3][c] != 0.0F) return false;
-    }
-    return true;
-}
-
-/// Takes a pre-LUT away that changes nothing, such as the one that a .csp file has to have. A .cms
-/// file has to have one too, and keeps its output side.
-void dropIdentityPreLUT(ol::LUT& lut, const std::string& extension) {
+/// Takes a pre-LUT away that changes nothing, such as the one that a .csp file has to have.
+void dropIdentityPreLUT(ol::LUT& lut) {
     const ol::Shaper* const shapers[] = {&lut.inputShaper, &lut.outputShaper};
     for (const ol::Shaper* const shaper : shapers) {
         const auto& entries = shaper->entries;
@@ -53,24 +42,7 @@ void dropIdentityPreLUT(ol::LUT& lut, const std::string& extension) {
         }
     }
     lut.inputShaper = {};
-    if (extension != ".cms") lut.outputShaper = {};
-}
-
-/// Says what the format cannot hold of a table.
-void warnOfLosses(const std::string& output, const std::string& extension, const ol::LUT& lut) {
-    const bool hasPreLUT = !lut.inputShaper.empty() || !lut.outputShaper.empty();
-    const bool keepsOutputShaper = extension == ".cub" || extension == ".cms";
-    if (hasPreLUT && extension == ".csp") {
-        warn(output + ": a .csp file does not give a pre-LUT back as it was");
-    } else if (hasPreLUT && !keepsOutputShaper) {
-        warn(fmt::format("{}: a {} file cannot hold the table's pre-LUT", output, extension));
-    } else if (!lut.inputShaper.empty()) {
-        warn(fmt::format("{}: a {} file cannot hold the input positions of the table's pre-LUT",
-                         output, extension));
-    }
-    if (!keepsDomain(lut, extension)) {
-        warn(fmt::format("{}: a {} file does not keep the table's domain", output, extension));
-    }
+    lut.outputShaper = {};
 }
 
 boost::shared_ptr<ol::LUTFileWriter> makeWriter(const ConvertOptions& options,
@@ -108,36 +80,142 @@ void writeTable(ol::LUTFileWriter& writer, const OutputFile& output, const std::
     }
 }
 
+/// Samples beyond what the codes of a .3dl file reach.
+struct Clipping {
+    std::uint64_t count = 0;
+    float farthest = 0.0F;  // of them, from the middle
+};
+
+Clipping clippingOf(const ol::LUT& lut, const std::string& extension, const Options3DL& options) {
+    Clipping clipping;
+    if (extension != ".3dl" || !options.clampOutput) return clipping;
+    const float* const samples = lut.data();
+    for (std::uint64_t i = 0; i < 3 * pointCount(lut); ++i) {
+        if (samples[i] >= 0.0F && samples[i] <= 1.0F) continue;
+        ++clipping.count;
+        if (std::fabs(samples[i] - 0.5F) > std::fabs(clipping.farthest - 0.5F)) {
+            clipping.farthest = samples[i];
+        }
+    }
+    return clipping;
+}
+
+/// How far the file's look is from that of the table that it was made of: at the file's points,
+/// half-way between them, and at random colours, within the domain that both have.
+double lookDeviation(const boost::shared_ptr<ol::LUT>& source,
+                     const boost::shared_ptr<ol::LUT>& written) {
+    const Domain domain = intersection(domainOf(*source), domainOf(*written));
+    const auto isInside = [&](const ol::RGB& colour) {
+        for (unsigned c = 0; c < 3; ++c) {
+            if (!(colour[c] >= domain.min[c] && colour[c] <= domain.max[c])) return false;
+        }
+        return true;
+    };
+    const ol::Evaluator a(source);
+    const ol::Evaluator b(written);
+    LookComparison comparison(a, b);
+    forEachInput(*written, true, [&](const ol::RGB& colour) {
+        if (isInside(colour)) comparison.add(colour);
+    });
+    forEachRandom(domain, kRandomColours, [&](const ol::RGB& colour) { comparison.add(colour); });
+    return largestOf(comparison.finish());
+}
+
+/// What half a unit of the format's last digit, and single precision, leave of a look.
+double precisionOf(const std::string& extension, const Options3DL& options, const ol::LUT& lut) {
+    float largest = 1.0F;
+    const float* const samples = lut.data();
+    for (std::uint64_t i = 0; i < 3 * pointCount(lut); ++i) {
+        if (std::isfinite(samples[i])) largest = std::max(largest, std::fabs(samples[i]));
+    }
+    // A pre-LUT's six digits are multiplied by the slope of what is behind it.
+    const double steepness = lut.inputShaper.empty() && lut.outputShaper.empty()
+                                 ? 1.0
+                                 : static_cast<double>(std::max(lut.width(), 2));
+    const double relative = 1e-6 * static_cast<double>(largest) * steepness;
+    if (extension != ".3dl") return 2e-6 + relative;
+    return 0.6 / (std::ldexp(1.0, options.outputBits) - 1.0) /
+               static_cast<double>(std::fabs(options.scale)) +
+           relative;
+}
+
+/// Reads the file back as its format means it, and compares looks.
+/// @return the summary's words
+std::string compareLooks(const OutputFile& output, const std::string& extension,
+                         const ConvertOptions& options, const Options3DL& options3DL,
+                         const boost::shared_ptr<ol::LUT>& source, const Fitted& fitted,
+                         const Clipping& clipping) {
+    const Table back =
+        readTable(output.stagedPath(), readingOf(extension, options3DL), output.name());
+    const double deviation = lookDeviation(source, back.lut);
+    std::string words = fmt::format("largest deviation {:.2g}", deviation);
+    std::vector<std::string> causes;
+    if (!fitted.whyResampled.empty()) causes.push_back("resampled for " + fitted.whyResampled);
+    if (clipping.count > 0) {
+        causes.push_back(
+            fmt::format("clipped: {} numbers, the farthest {}", clipping.count, clipping.farthest));
+    }
+    if (options.writing.hasPreLUT()) causes.emplace_back("the pre-LUT as asked for");
+    if (options.writing.scale || options.writing.offset) causes.emplace_back("scale and offset");
+    if (!causes.empty()) return fmt::format("{} ({})", words, fmt::join(causes, "; "));
+    if (deviation > precisionOf(extension, options3DL, *fitted.lut)) {
+        throw Failure(
+            fmt::format("{}: read back, its look is off by {:.2g}", output.name(), deviation));
+    }
+    return words;
+}
+
+Fitted fitTo(const ConvertOptions& options, const boost::shared_ptr<ol::LUT>& lut,
+             const std::string& extension) {
+    try {
+        return fit(lut, extension, options.size);
+    } catch (const Failure& failure) {
+        throw Failure(fmt::format("{}: {}", options.output, failure.what()));
+    }
+}
+
+void setFlag(ol::LUTFileWriter& writer, const char* name, int value) {
+    writer.setProperty(name, Orlith::Property::makeProperty<Orlith::Property::Int>(name, value));
+}
+
 int runConvert(const ConvertOptions& options) {
     const std::string extension = formatOf(options.output, options.to);
     const Options3DL options3DL = options.writing.options3DL();
     const auto writer = makeWriter(options, extension);
     setWriterProperties(*writer, options3DL);
-    writer->setProperty("flushLines",
-                        Orlith::Property::makeProperty<Orlith::Property::Int>("flushLines", 0));
+    setFlag(*writer, "flushLines", 0);
+    // A pre-LUT that is asked for is written by the book.
+    const bool isByBook = options.reading.isStrict || options.writing.hasPreLUT();
+    setFlag(*writer, "interchange", isByBook ? 0 : 1);
 
     const Table table = readWholeTable(options.input, options.reading);
-    dropIdentityPreLUT(*table.lut, extension);
-    addPreLUT(*table.lut, options.writing);
-    const std::string unreadable = whyUnreadable(extension, *table.lut);
-    if (!unreadable.empty() && !options.reading.isStrict) {
-        throw Failure(fmt::format("{}: {}", options.output, unreadable));
-    }
-    OutputFile output(options.output);
-    writeTable(*writer, output, extension, table.lut);
-    warnOfLosses(output.name(), extension, *table.lut);
+    dropIdentityPreLUT(*table.lut);
+    Fitted fitted{table.lut, "", ""};
+    if (!options.reading.isStrict) fitted = fitTo(options, table.lut, extension);
+    addPreLUT(*fitted.lut, options.writing);
+    const std::string unreadable = whyUnreadable(extension, *fitted.lut);
+    const Clipping clipping = clippingOf(*fitted.lut, extension, options3DL);
 
-    Verification verification;
-    verification.reason = output.whyNotReadBack(options.skipsVerification);
-    if (verification.reason.empty()) verification.reason = unreadable;
-    if (verification.reason.empty()) {
-        verification =
-            verify(output.stagedPath(), output.name(), extension, *table.lut, options3DL);
+    OutputFile output(options.output);
+    writeTable(*writer, output, extension, fitted.lut);
+    if (!fitted.domainChange.empty()) {
+        warn(fmt::format("{}: its domain shrinks {}", output.name(), fitted.domainChange));
+    }
+    std::string words = output.whyNotReadBack(options.skipsVerification);
+    if (words.empty()) words = unreadable;
+    if (!words.empty()) {
+        words = "not verified: " + words;
+    } else {
+        words = fmt::format("largest deviation {:.2g}",
+                            verify(output.stagedPath(), output.name(), extension, *fitted.lut,
+                                   options3DL, isByBook));
+        if (!options.reading.isStrict) {
+            words =
+                compareLooks(output, extension, options, options3DL, table.lut, fitted, clipping);
+        }
     }
     output.deliver();
-    if (!options.isQuiet) {
-        output.print(summary(output.name(), extension, *table.lut, verification));
-    }
+    if (!options.isQuiet) output.print(summary(output.name(), extension, *fitted.lut, words));
     return kDone;
 }
 
@@ -155,6 +233,8 @@ void addConvert(CLI::App& program, int& status) {
             "--to", [options](const std::string& extension) { options->to = withDot(extension); },
             "Format to write where the name does not tell, such as 3dl")
         ->type_name("EXT");
+    addInteger(*command, "--size", 2, 256, "Points a side; resamples a table of another size",
+               [options](int size) { options->size = size; });
     addReadOptions(*command, options->reading);
     addWriteOptions(*command, options->writing);
     command->add_flag("--no-verify", options->skipsVerification,

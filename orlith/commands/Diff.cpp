@@ -3,11 +3,13 @@
 #include <algorithm>
 #include <cmath>
 #include <cstdint>
-#include <limits>
 
 #include "lut/io/Lattice.h"
+#include "orlith/ColourOptions.h"
 #include "orlith/Command.h"
 #include "orlith/Facts.h"
+#include "orlith/Json.h"
+#include "orlith/Look.h"
 #include "orlith/Options.h"
 #include "orlith/TableFile.h"
 
@@ -20,64 +22,80 @@ struct DiffOptions {
     std::string a;
     std::string b;
     ReadOptions reading;
+    ColourOptions colours;
     double tolerance = 0.0;
+    bool isJson = false;
 };
 
-/// Differences of one channel.
-class Differences {
-public:
-    void add(float a, float b) {
-        ++count_;
-        if (a == b || (std::isnan(a) && std::isnan(b))) return;
-        double difference = std::fabs(static_cast<double>(a) - static_cast<double>(b));
-        if (std::isnan(difference)) difference = std::numeric_limits<double>::infinity();
-        largest_ = std::max(largest_, difference);
-        sum_ += difference;
-        squares_ += difference * difference;
-    }
-
-    double largest() const { return largest_; }
-    double mean() const { return count_ == 0 ? 0.0 : sum_ / static_cast<double>(count_); }
-    double rootMeanSquare() const {
-        return count_ == 0 ? 0.0 : std::sqrt(squares_ / static_cast<double>(count_));
-    }
-
-private:
-    std::uint64_t count_ = 0;
-    double largest_ = 0.0;
-    double sum_ = 0.0;
-    double squares_ = 0.0;
-};
+constexpr const char* kChannels[] = {"red", "green", "blue"};
 
 bool sameSize(const ol::LUT& a, const ol::LUT& b) {
     if (a.is1D() || b.is1D()) return a.is1D() && b.is1D() && a.width() == b.width();
     return a.width() == b.width() && a.height() == b.height() && a.depth() == b.depth();
 }
 
-/// Calls visit(a's sample, b's sample) at the points of the larger table. The other table is
-/// interpolated there, beyond its domain in straight lines.
-template <class Visit>
-void forEachPair(const Table& a, const Table& b, Visit&& visit) {
-    if (sameSize(*a.lut, *b.lut)) {
-        for (std::uint64_t i = 0; i < 3 * a.pointCount; ++i) {
-            visit(static_cast<unsigned>(i % 3), a.lut->data()[i], b.lut->data()[i]);
-        }
-        return;
-    }
+/// By the book: sample by sample; where sizes differ, at the points of the larger table, where the
+/// other is interpolated, beyond its domain in straight lines.
+Differences compareSamples(const Table& a, const Table& b) {
+    Differences differences;
     const bool isALarger = a.pointCount >= b.pointCount;
     const ol::LUT& larger = isALarger ? *a.lut : *b.lut;
     const ol::LUT& smaller = isALarger ? *b.lut : *a.lut;
+    const bool isAsLarge = sameSize(larger, smaller);
     const ol::LatticeSize size =
         larger.is1D() ? ol::LatticeSize{larger.width(), 1, 1} : ol::LatticeSize::of(larger);
     ol::LatticePosition point;
     ol::forEachRedFastest(size, [&](std::size_t element) {
         const ol::RGB input = larger.is1D() ? inputColour(larger, point.r, point.r, point.r)
                                             : inputColour(larger, point.r, point.g, point.b);
-        const ol::RGB there = smaller.interpolate(input, ol::Trilinear, true);
+        ol::RGB there;
+        if (isAsLarge) {
+            std::copy_n(smaller.data() + 3 * element, 3, there.data_block());
+        } else {
+            there = smaller.interpolate(input, ol::Trilinear, true);
+        }
         for (unsigned c = 0; c < 3; ++c)
-            visit(c, larger.data()[3 * element + c], there[c]);
+            addDifference(differences[c], larger.data()[3 * element + c], there[c], input);
         point.advanceRedFastest(size);
     });
+    finishDifferences(differences, std::max(a.pointCount, b.pointCount));
+    return differences;
+}
+
+/// As people see it: at the points of the larger table and at random colours of both.
+Differences compareLooks(const Table& a, const Table& b, const ColourOptions& colours) {
+    const ol::Evaluator evaluatorA = colours.evaluator(a.lut);
+    const ol::Evaluator evaluatorB = colours.evaluator(b.lut);
+    LookComparison comparison(evaluatorA, evaluatorB);
+    const auto add = [&](const ol::RGB& colour) { comparison.add(colour); };
+    forEachInput(a.pointCount >= b.pointCount ? *a.lut : *b.lut, false, add);
+    forEachRandom(domainOf(*a.lut), kRandomColours / 2, add);
+    forEachRandom(domainOf(*b.lut), kRandomColours / 2, add);
+    return comparison.finish();
+}
+
+void printText(const Differences& differences) {
+    fmt::print("{:<8}{:>14}{:>14}{:>14}  {}\n", "", "largest", "mean", "rms", "largest at");
+    for (unsigned c = 0; c < 3; ++c) {
+        const Difference& each = differences[c];
+        fmt::print("{:<8}{:>14.6g}{:>14.6g}{:>14.6g}  {}\n", kChannels[c], each.largest, each.mean,
+                   each.rootMeanSquare,
+                   each.largest > 0.0 ? colourText(each.at.data_block()) : "-");
+    }
+}
+
+void printJson(const Differences& differences, bool isWithin) {
+    const auto number = [](double value) {
+        return std::isfinite(value) ? fmt::format("{}", value) : std::string("\"inf\"");
+    };
+    fmt::print("{{\"within_tolerance\": {}", isWithin);
+    for (unsigned c = 0; c < 3; ++c) {
+        const Difference& each = differences[c];
+        fmt::print(",\n \"{}\": {{\"largest\": {}, \"at\": {}, \"mean\": {}, \"rms\": {}}}",
+                   kChannels[c], number(each.largest), jsonTriple(each.at.data_block()),
+                   number(each.mean), number(each.rootMeanSquare));
+    }
+    fmt::print("}}\n");
 }
 
 /// --from is for the table whose name does not tell its format, if the other one's does.
@@ -93,16 +111,13 @@ int runDiff(const DiffOptions& options) {
     }
     const Table a = readWholeTable(options.a, readingOf(options.a, options.reading));
     const Table b = readWholeTable(options.b, readingOf(options.b, options.reading));
-    Differences channels[3];
-    forEachPair(a, b, [&](unsigned c, float x, float y) { channels[c].add(x, y); });
-
-    const char* const names[] = {"red", "green", "blue"};
-    fmt::print("{:<8}{:>14}{:>14}{:>14}\n", "", "largest", "mean", "rms");
-    bool isWithin = true;
-    for (unsigned c = 0; c < 3; ++c) {
-        fmt::print("{:<8}{:>14.6g}{:>14.6g}{:>14.6g}\n", names[c], channels[c].largest(),
-                   channels[c].mean(), channels[c].rootMeanSquare());
-        isWithin = isWithin && channels[c].largest() <= options.tolerance;
+    const Differences differences =
+        options.reading.isStrict ? compareSamples(a, b) : compareLooks(a, b, options.colours);
+    const bool isWithin = largestOf(differences) <= options.tolerance;
+    if (options.isJson) {
+        printJson(differences, isWithin);
+    } else {
+        printText(differences);
     }
     return isWithin ? kDone : kFailed;
 }
@@ -117,6 +132,8 @@ void addDiff(CLI::App& program, int& status) {
     command->add_option("LUT_B", options->b, "Table to compare it with")->required();
     addFromOption(*command, options->reading);
     addReadOptions(*command, options->reading);
+    addColourOptions(*command, options->colours);
+    command->add_flag("--json", options->isJson, "Print one JSON object");
     addReal(*command, "--tolerance", "Largest difference that is none, from 0 on (0)",
             [options](double tolerance) {
                 if (tolerance < 0.0) {

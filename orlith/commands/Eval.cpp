@@ -1,12 +1,13 @@
 #include <fmt/format.h>
 
+#include <functional>
 #include <iostream>
-#include <map>
 #include <string>
 #include <vector>
 
 #include "lut/io/text/Numbers.h"
 #include "lut/io/text/Tokens.h"
+#include "orlith/ColourOptions.h"
 #include "orlith/Command.h"
 #include "orlith/Options.h"
 #include "orlith/TableFile.h"
@@ -19,8 +20,7 @@ namespace ol = Orlith::LUT;
 struct EvalOptions {
     std::string path;
     ReadOptions reading;
-    ol::InterpolationMode mode = ol::Trilinear;
-    bool extrapolates = false;
+    ColourOptions colours;
     std::vector<std::string> colour;
 };
 
@@ -32,12 +32,25 @@ bool parseColour(std::string_view word, float& number) {
     return true;
 }
 
-void evaluate(const ol::LUT& lut, const EvalOptions& options, const ol::RGB& colour) {
-    const ol::RGB result = lut.interpolate(colour, options.mode, options.extrapolates);
-    fmt::print("{}\n", colourText(result.data_block()));
+void print(const ol::RGB& colour) {
+    fmt::print("{}\n", colourText(colour.data_block()));
 }
 
-void evaluateInput(const ol::LUT& lut, const EvalOptions& options) {
+/// The way of one colour through the table: as its maker means it, or by the book.
+std::function<ol::RGB(const ol::RGB&)> wayThrough(const Table& table, const EvalOptions& options) {
+    const ColourOptions& colours = options.colours;
+    if (options.reading.isStrict) {
+        return [lut = table.lut, mode = colours.bookMode(), extrapolates = colours.extrapolates](
+                   const ol::RGB& colour) { return lut->interpolate(colour, mode, extrapolates); };
+    }
+    return [evaluator = colours.evaluator(table.lut)](const ol::RGB& colour) {
+        ol::RGB result;
+        evaluator.apply(colour.data_block(), result.data_block(), 1);
+        return result;
+    };
+}
+
+void evaluateInput(const std::function<ol::RGB(const ol::RGB&)>& way) {
     std::string line;
     for (int number = 1; std::getline(std::cin, line); ++number) {
         const ol::Tokens words(ol::trim(line));
@@ -49,7 +62,7 @@ void evaluateInput(const ol::LUT& lut, const EvalOptions& options) {
         if (!isColour) {
             throw Failure(fmt::format("standard input:{}: expected three numbers", number));
         }
-        evaluate(lut, options, colour);
+        print(way(colour));
     }
 }
 
@@ -65,10 +78,11 @@ int runEval(const EvalOptions& options) {
     }
     const Table table = options.reading.isStrict ? readTableAndWarn(options.path, options.reading)
                                                  : readWholeTable(options.path, options.reading);
+    const auto way = wayThrough(table, options);
     if (options.colour.empty()) {
-        evaluateInput(*table.lut, options);
+        evaluateInput(way);
     } else {
-        evaluate(*table.lut, options, colour);
+        print(way(colour));
     }
     return kDone;
 }
@@ -83,16 +97,7 @@ void addEval(CLI::App& program, int& status) {
     command->add_option("COLOUR", options->colour, "Red, green and blue")->expected(3);
     addFromOption(*command, options->reading);
     addReadOptions(*command, options->reading);
-    const std::map<std::string, ol::InterpolationMode> modes = {{"step", ol::Step},
-                                                                {"staggered", ol::LinearStaggered},
-                                                                {"trilinear", ol::Trilinear},
-                                                                {"cubic", ol::Cubic}};
-    command->add_option("--mode", options->mode, "Interpolation of a lattice (trilinear)")
-        ->transform(
-            CLI::Transformer(modes, CLI::ignore_case).description("step|staggered|trilinear|cubic"))
-        ->type_name("");
-    command->add_flag("--extrapolate", options->extrapolates,
-                      "Continue a lattice beyond its domain in straight lines");
+    addColourOptions(*command, options->colours);
     command->callback([options, &status] { status = runEval(*options); });
 }
 

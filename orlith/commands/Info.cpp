@@ -2,12 +2,12 @@
 
 #include <cmath>
 #include <cstdint>
-#include <nlohmann/json.hpp>
 #include <optional>
 #include <string>
 
 #include "orlith/Command.h"
 #include "orlith/Facts.h"
+#include "orlith/Json.h"
 #include "orlith/Messages.h"
 #include "orlith/TableFile.h"
 
@@ -32,24 +32,6 @@ std::optional<Facts> facts(const Table& table) {
 }
 
 // JSON
-
-/// A string; a byte of a file name that is no UTF-8 becomes the replacement character.
-std::string jsonText(const std::string& text) {
-    constexpr int kOneLine = -1;
-    return nlohmann::json(text).dump(kOneLine, ' ', false,
-                                     nlohmann::json::error_handler_t::replace);
-}
-
-/// The shortest digits that give the same float; JSON has no numbers for what is not finite.
-std::string jsonNumber(float number) {
-    if (std::isnan(number)) return "\"nan\"";
-    if (std::isinf(number)) return number > 0 ? "\"inf\"" : "\"-inf\"";
-    return fmt::format("{}", number);
-}
-
-std::string jsonTriple(const float* rgb) {
-    return fmt::format("[{}, {}, {}]", jsonNumber(rgb[0]), jsonNumber(rgb[1]), jsonNumber(rgb[2]));
-}
 
 std::string jsonRange(const ol::RGB& min, const ol::RGB& max) {
     return fmt::format("{{\"min\": {}, \"max\": {}}}", jsonTriple(min.data_block()),
@@ -78,6 +60,15 @@ std::string jsonTransform(const ol::Transform& transform) {
     return "[" + rows + "]";
 }
 
+std::string jsonRemarks(const Table& table) {
+    std::string list;
+    for (const ol::Remark& remark : table.remarks) {
+        if (!list.empty()) list += ", ";
+        list += fmt::format("{{\"line\": {}, \"text\": {}}}", remark.line, jsonText(remark.text));
+    }
+    return "[" + list + "]";
+}
+
 void printJson(const Table& table, const InfoOptions& options) {
     const ol::LUT& lut = *table.lut;
     ol::RGB min;
@@ -94,7 +85,8 @@ void printJson(const Table& table, const InfoOptions& options) {
                jsonRange(min, max));
     fmt::print(" \"inputShaper\": {}, \"outputShaper\": {},\n", jsonShaper(lut.inputShaper),
                jsonShaper(lut.outputShaper));
-    fmt::print(" \"range\": {}", found ? jsonRange(found->min, found->max) : "null");
+    fmt::print(" \"range\": {},\n", found ? jsonRange(found->min, found->max) : "null");
+    fmt::print(" \"remarks\": {}", jsonRemarks(table));
     if (options.showsValues) {
         fmt::print(",\n \"values\": [");
         for (std::uint64_t i = 0; i < table.pointCount; ++i) {

@@ -1,0 +1,52 @@
+#include "orlith/ColourOptions.h"
+
+#include <map>
+#include <string>
+
+#include "orlith/Command.h"
+
+namespace orlith {
+namespace {
+
+namespace ol = Orlith::LUT;
+using Method = ol::Evaluator::Method;
+
+}  // namespace
+
+ol::Evaluator ColourOptions::evaluator(const boost::shared_ptr<const ol::LUT>& table) const {
+    return ol::Evaluator(
+        table, method,
+        extrapolates ? ol::Evaluator::Outside::Extrapolate : ol::Evaluator::Outside::Clamp);
+}
+
+ol::InterpolationMode ColourOptions::bookMode() const {
+    switch (method) {
+        case Method::Step:
+            return ol::Step;
+        case Method::Staggered:
+            return ol::LinearStaggered;
+        case Method::Trilinear:
+            return ol::Trilinear;
+        case Method::Cubic:
+            return ol::Cubic;
+        case Method::Tetrahedral:
+            break;
+    }
+    throw UsageError("--mode tetrahedral does not go with --strict");
+}
+
+void addColourOptions(CLI::App& command, ColourOptions& options) {
+    const std::map<std::string, Method> methods = {{"step", Method::Step},
+                                                   {"staggered", Method::Staggered},
+                                                   {"trilinear", Method::Trilinear},
+                                                   {"tetrahedral", Method::Tetrahedral},
+                                                   {"cubic", Method::Cubic}};
+    command.add_option("--mode", options.method, "Interpolation of a lattice (trilinear)")
+        ->transform(CLI::Transformer(methods, CLI::ignore_case)
+                        .description("step|staggered|trilinear|tetrahedral|cubic"))
+        ->type_name("");
+    command.add_flag("--extrapolate", options.extrapolates,
+                     "Continue a lattice beyond its domain in straight lines; else clamp to it");
+}
+
+}  // namespace orlith

@@ -1,0 +1,24 @@
+#pragma once
+
+#include <CLI/CLI.hpp>
+#include <boost/smart_ptr/shared_ptr.hpp>
+
+#include "lut/Evaluator.h"
+
+namespace orlith {
+
+/// How colours go through a table.
+struct ColourOptions {
+    Orlith::LUT::Evaluator::Method method = Orlith::LUT::Evaluator::Method::Trilinear;
+    bool extrapolates = false;
+
+    Orlith::LUT::Evaluator evaluator(const boost::shared_ptr<const Orlith::LUT::LUT>& table) const;
+
+    /// The library's own mode of that name.
+    /// @throws UsageError  it has none: tetrahedral
+    Orlith::LUT::InterpolationMode bookMode() const;
+};
+
+void addColourOptions(CLI::App& command, ColourOptions& options);
+
+}  // namespace orlith

@@ -1,0 +1,25 @@
+#pragma once
+
+#include <boost/smart_ptr/shared_ptr.hpp>
+#include <string>
+
+#include "lut/LUT.h"
+
+namespace orlith {
+
+/// A table as a format holds it.
+struct Fitted {
+    boost::shared_ptr<Orlith::LUT::LUT> lut;
+    std::string whyResampled;  ///< empty: the table as it is
+    std::string domainChange;  ///< "from 0 0 0 to 4 4 4, to 0 0 0 to 1 1 1"; empty: it is kept
+};
+
+/// Makes a table that a format's writer, as other programs mean the format, holds with its look:
+/// the table itself where it can be, otherwise one whose points are the table's own look there.
+///
+/// @param size       points a side wanted; 0: the table's own, or 33 where a curve becomes a
+///                   lattice
+/// @throws Failure   no table of that size
+Fitted fit(const boost::shared_ptr<Orlith::LUT::LUT>& lut, const std::string& extension, int size);
+
+}  // namespace orlith
