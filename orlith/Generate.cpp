@@ -8,7 +8,7 @@
 #include "orlith/Command.h"
 #include "orlith/ImageOptions.h"
 #include "orlith/Knobs.h"
-#include "orlith/PatternTable.h"
+#include "orlith/PatternReading.h"
 #include "orlith/TableFile.h"
 #include "orlith/Verification.h"
 #include "orlith/WriteOptions.h"
@@ -22,6 +22,7 @@ struct GenerateOptions {
     std::string output;
     Knobs controls;  // of the options, in the order in which they are set
     Knobs knobs;
+    bool isForced = false;
     bool skipsVerification = false;
     bool isQuiet = false;
 };
@@ -117,7 +118,9 @@ int runGenerate(const GenerateOptions& options) {
     if (path.empty()) throw UsageError("the output file has no name");
 
     zefra::Iop& image = openImage(read);
-    checkPattern(options.image, image);
+    const PatternReading pattern = readPattern(options.image, image, options.isForced);
+    for (const std::string& text : pattern.warnings)
+        warn(text);
 
     const CancellableOutput output(path);
     {
@@ -132,7 +135,7 @@ int runGenerate(const GenerateOptions& options) {
     }
 
     const std::string extension = formatWritten(generate, path);
-    const auto table = tableOfPattern(image);
+    const auto& table = pattern.table;
     addPreLUT(*table, generate);
     Verification verification;
     verification.reason = "--no-verify";
@@ -184,6 +187,8 @@ void addGenerate(CLI::App& program, int& status) {
     }
     addKnobOption(*command, options->knobs);
     addImageChoice(*command, options->choice);
+    command->add_flag("--force", options->isForced,
+                      "Take an image that does not look like a pattern");
     command->add_flag("--no-verify", options->skipsVerification,
                       "Do not read the written file back to compare it");
     command->add_flag("--quiet", options->isQuiet, "Do not say what was written");
