@@ -1,6 +1,5 @@
 #include "orlith/Generated.h"
 
-#include "orlith/PatternTable.h"
 #include "orlith/TableFile.h"
 #include "orlith/Verification.h"
 #include "orlith/WriteOptions.h"
@@ -41,17 +40,16 @@ std::string formatWritten(const host::Node& node, const std::string& name) {
     return formatOf(name, type.find('.') == std::string::npos ? "" : type);
 }
 
-std::string reportGenerated(host::Node& node, const Generated& file) {
+std::string reportGenerated(host::Node& node, Orlith::LUT::LUT3D& table, const Generated& file) {
     const std::string extension = formatWritten(node, file.name);
-    const auto table = tableOfPattern(node.image()->input(0));
-    addPreLUT(*table, node);
+    addPreLUT(table, node);
     Verification verification;
     verification.reason = file.whyNotReadBack;
     if (verification.reason.empty()) {
         const Options3DL options3DL = extension == ".3dl" ? options3DLOf(node) : Options3DL();
-        verification = verify(file.path, file.name, extension, *table, options3DL);
+        verification = verify(file.path, file.name, extension, table, options3DL);
     }
-    return summary(file.name, extension, *table, verification);
+    return summary(file.name, extension, table, verification);
 }
 
 }  // namespace orlith
