@@ -73,6 +73,10 @@ void press(host::Host& host, const Button& button) {
     for (const auto& each : host.nodes())
         each->setProgress(nullptr);
     if (host::Host::cancelRequested()) throw Cancelled();
+    for (const auto& node : host.nodes()) {
+        for (const std::string& text : node->takeWarnings())
+            warn(fmt::format("{}: {}", node->name(), text));
+    }
     if (const auto errors = takeErrors(host); !errors.empty()) {
         throw Failure(fmt::format("{}", fmt::join(errors, "; ")));
     }
