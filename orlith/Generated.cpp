@@ -8,7 +8,6 @@
 #include "lut/LUT3D.h"
 #include "orlith/Look.h"
 #include "orlith/Messages.h"
-#include "orlith/PatternTable.h"
 #include "orlith/TableFile.h"
 #include "orlith/Verification.h"
 #include "orlith/WriteOptions.h"
@@ -45,7 +44,7 @@ void addPreLUT(Orlith::LUT::LUT& lut, const host::Node& node) {
 /// Warns where the operator's file does not have the pattern's look for those who read it: its
 /// pre-LUT from 0 to 1 reaches the first cell only where a format wants lattice units.
 void warnOfOtherLook(const Generated& file, const std::string& extension,
-                     const boost::shared_ptr<Orlith::LUT::LUT3D>& table) {
+                     const Orlith::LUT::LUT3D& table) {
     if (extension != ".cub" && extension != ".cms") return;
     ReadOptions reading;
     reading.from = extension;
@@ -53,8 +52,8 @@ void warnOfOtherLook(const Generated& file, const std::string& extension,
     const Orlith::LUT::Evaluator read(back.lut);
     // What the pattern stands for: its colours as they are, without the pre-LUT.
     const auto look = boost::make_shared<Orlith::LUT::LUT3D>();
-    look->resize(table->width(), table->height(), table->depth());
-    std::copy_n(table->data(), 3 * pointCount(*table), look->data());
+    look->resize(table.width(), table.height(), table.depth());
+    std::copy_n(table.data(), 3 * pointCount(table), look->data());
     Orlith::LUT::setUnitDomain(*look, look->width(), look->height(), look->depth());
     const Orlith::LUT::Evaluator meant(look);
     LookComparison comparison(read, meant);
@@ -76,18 +75,16 @@ std::string formatWritten(const host::Node& node, const std::string& name) {
     return formatOf(name, type.find('.') == std::string::npos ? "" : type);
 }
 
-std::string reportGenerated(host::Node& node, const Generated& file) {
+std::string reportGenerated(host::Node& node, Orlith::LUT::LUT3D& table, const Generated& file) {
     const std::string extension = formatWritten(node, file.name);
-    const auto table = tableOfPattern(node.image()->input(0));
     if (!file.whyNotReadBack.empty()) {
-        return summary(file.name, extension, *table, "not verified: " + file.whyNotReadBack);
+        return summary(file.name, extension, table, "not verified: " + file.whyNotReadBack);
     }
-    addPreLUT(*table, node);
+    addPreLUT(table, node);
     const Options3DL options3DL = extension == ".3dl" ? options3DLOf(node) : Options3DL();
-    const double deviation = verify(file.path, file.name, extension, *table, options3DL);
+    const double deviation = verify(file.path, file.name, extension, table, options3DL);
     warnOfOtherLook(file, extension, table);
-    return summary(file.name, extension, *table,
-                   fmt::format("largest deviation {:.2g}", deviation));
+    return summary(file.name, extension, table, fmt::format("largest deviation {:.2g}", deviation));
 }
 
 }  // namespace orlith

@@ -3,6 +3,7 @@
 #include <string>
 
 #include "host/Node.h"
+#include "lut/LUT3D.h"
 
 namespace orlith {
 
@@ -16,10 +17,11 @@ struct Generated {
 /// The format that the operator writes: its file type, or the name's extension where that is blank.
 std::string formatWritten(const host::Node& node, const std::string& name);
 
-/// Reads the node's file back and compares it with the pattern at its input.
+/// Reads the node's file back and compares it with the pattern that it was made of.
 /// @param node      executed without an error; its controls may change
+/// @param table     of the pattern; gets the operator's pre-LUT
 /// @return          the line that says what was written
 /// @throws Failure  the file is not what the pattern says
-std::string reportGenerated(host::Node& node, const Generated& file);
+std::string reportGenerated(host::Node& node, Orlith::LUT::LUT3D& table, const Generated& file);
 
 }  // namespace orlith

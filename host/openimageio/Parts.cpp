@@ -103,6 +103,7 @@ std::vector<Part> partsOf(OIIO::ImageInput& input) {
 [[noreturn]] void failWithoutPart(const std::vector<Part>& parts, int index,
                                   const std::string& path) {
     std::vector<std::string> texts;
+    texts.reserve(parts.size());
     for (const Part& each : parts)
         texts.push_back(each.text());
     throw Error(path, fmt::format("has no part {}; it has {}", index, fmt::join(texts, ", ")));

@@ -9,9 +9,10 @@
 #include "orlith/Generated.h"
 #include "orlith/ImageOptions.h"
 #include "orlith/Knobs.h"
+#include "orlith/Messages.h"
 #include "orlith/Options.h"
 #include "orlith/OutputFile.h"
-#include "orlith/PatternTable.h"
+#include "orlith/PatternReading.h"
 #include "orlith/TableFile.h"
 #include "orlith/WriteOptions.h"
 
@@ -24,6 +25,7 @@ struct GenerateOptions {
     std::string output;
     Knobs controls;  // of the options, in the order in which they are set
     Knobs knobs;
+    bool isForced = false;
     bool skipsVerification = false;
     bool isQuiet = false;
 };
@@ -122,13 +124,15 @@ int runGenerate(const GenerateOptions& options) {
     setControls(generate, options);
 
     zefra::Iop& image = openImage(read);
-    checkPattern(options.image, image);
+    const PatternReading pattern = readPattern(options.image, image, options.isForced);
+    for (const std::string& text : pattern.warnings)
+        warn(text);
 
     OutputFile output(generate.value("file"));
     setStage(generate, output);
     execute(generate, output);
     const std::string line = reportGenerated(
-        generate,
+        generate, *pattern.table,
         {output.stagedPath(), output.name(), output.whyNotReadBack(options.skipsVerification)});
     output.deliver();
     if (!options.isQuiet) output.print(line);
@@ -175,6 +179,8 @@ void addGenerate(CLI::App& program, int& status) {
     }
     addKnobOption(*command, options->knobs);
     addImageChoice(*command, options->choice);
+    command->add_flag("--force", options->isForced,
+                      "Take an image that does not look like a pattern");
     command->add_flag("--no-verify", options->skipsVerification,
                       "Do not read the written file back to compare it");
     command->add_flag("--quiet", options->isQuiet, "Do not say what was written");

@@ -11,6 +11,7 @@
 #include "orlith/Generated.h"
 #include "orlith/Messages.h"
 #include "orlith/OutputFile.h"
+#include "orlith/PatternReading.h"
 
 namespace orlith {
 namespace {
@@ -72,6 +73,10 @@ void press(host::Host& host, const Button& button) {
     for (const auto& each : host.nodes())
         each->setProgress(nullptr);
     if (host::Host::cancelRequested()) throw Cancelled();
+    for (const auto& node : host.nodes()) {
+        for (const std::string& text : node->takeWarnings())
+            warn(fmt::format("{}: {}", node->name(), text));
+    }
     if (const auto errors = takeErrors(host); !errors.empty()) {
         throw Failure(fmt::format("{}", fmt::join(errors, "; ")));
     }
@@ -84,8 +89,12 @@ void report(host::Node& node) {
         throw Failure(
             fmt::format("{}: nothing was written: its control \"file\" is empty", node.name()));
     }
+    // The file is written already: what is wrong with the pattern can only be said.
+    const PatternReading pattern = readPattern(node.name(), node.image()->input(0), true);
+    for (const std::string& text : pattern.warnings)
+        warn(text);
     const std::string reason = isStream(path) ? "a pipe or a device is not read back" : "";
-    fmt::print("{}", reportGenerated(node, {path, path, reason}));
+    fmt::print("{}", reportGenerated(node, *pattern.table, {path, path, reason}));
 }
 
 int runRun(const RunOptions& options) {

@@ -123,13 +123,12 @@ TEST_F(ImageFileTest, TakesTheImageThatIsChosenOrMeant) {
             specs.push_back(markedSpec(channels));
         writeMarked(path, specs);
         std::string words;
-        words = failureOf([&] {
-                    host::ImageFile image(path, each.choice);
-                    expectLine(image, 1, 0, 1, each.red, each.green, each.blue, each.part);
-                    words = path + ": " + image.remark();
-                }) +
-                words;
-        EXPECT_EQ(words, path + ": " + each.words);
+        const std::string failure = failureOf([&] {
+            host::ImageFile image(path, each.choice);
+            expectLine(image, 1, 0, 1, each.red, each.green, each.blue, each.part);
+            words = image.remark();
+        });
+        EXPECT_EQ(failure.empty() ? words : failure.substr(path.size() + 2), each.words);
     }
 }
 

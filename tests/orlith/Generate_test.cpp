@@ -10,6 +10,10 @@ namespace fs = std::filesystem;
 
 #define SIZE_WARNING "Warning: Flame/Lustre prefers 3DL files of 17x17x17, 33x33x33, 65x65x65\n"
 
+#define WILD_WARNING                                                                          \
+    "orlith: warning: wild.exr: 16 of 24 samples are not finite, the first in the patch at x" \
+    " 0 and y 0 from the bottom left (a division by zero, the logarithm of a negative number?)\n"
+
 class GenerateTest : public test::ProgramTest {
 protected:
     GenerateTest() { test::writePattern(folder_.path("p.exr"), 5); }
@@ -136,17 +140,20 @@ TEST_F(GenerateTest, RefusesImagesThatAreNoPattern) {
     EXPECT_FALSE(exists("o.cube"));
 }
 
-TEST_F(GenerateTest, WarnsOfAPatternThatIsNotWhole) {
-    const auto white = [](int, int) { return test::Pixel{1, 1, 1}; };
-    test::writeImage(folder_.path("low.exr"), 84, 15, white);
-    test::writeImage(folder_.path("odd.exr"), 91, 119, white);
+TEST_F(GenerateTest, TakesWhatIsNoPatternByForce) {
+    test::writeImage(folder_.path("low.exr"), 84, 15, [](int, int) {
+        return test::Pixel{1, 1, 1};
+    });
+    const std::string reason =
+        "low.exr: no pattern has 84 x 15 pixels; the nearest by its width, of 5 points, has 84 x 77"
+        " (resized, cropped or padded?)\n";
+    expect("generate low.exr o.cube", 1, "", "orlith: error: " + reason);
+    expect("generate low.exr o.cube --force --quiet", 0, "", "orlith: warning: " + reason);
     expectAll({
-        {"generate low.exr low.cube", 0, "low.cube: .cube, 5 x 5 x 5 points, largest deviation 0\n",
-         "orlith: warning: low.exr: holds 24 patches, a 5-point pattern has 125\n"},
-        {"eval low.cube 0.75 1 0 --mode step", 0, "1 1 1\n", ""},
-        {"eval low.cube 1 1 0 --mode step", 0, "0 0 0\n", ""},
-        {"generate odd.exr odd.cube", 0, "odd.cube: .cube, 6 x 6 x 6 points, largest deviation 0\n",
-         "orlith: warning: odd.exr: is 13 patches wide, a 6-point pattern 15\n"},
+        {"generate p.exr o.cube --part 1", 1, "",
+         "orlith: error: p.exr: has no part 1; it has 0\n"},
+        {"generate p.exr o.cube --layer a", 1, "",
+         "orlith: error: p.exr: has no layer \"a\"; it has none\n"},
     });
 }
 
@@ -155,13 +162,14 @@ TEST_F(GenerateTest, KeepsWhatIsNotFinite) {
     test::writePattern(folder_.path("wild.exr"), 2, [&](const test::Pixel& colour) {
         return test::Pixel{colour.r > 0 ? kInfinity : std::nanf(""), -kInfinity, 3e9F};
     });
-    EXPECT_EQ(output("generate wild.exr wild.cube --quiet"), "");
+    expect("generate wild.exr wild.cube --quiet", 0, "", WILD_WARNING);
     EXPECT_EQ(read("wild.cube").substr(47, 47), "nan -inf 3000000000.000000\ninf -inf 3000000000.");
-    EXPECT_EQ(output("generate wild.exr wild.blut --quiet"), "");
-    expect("generate wild.exr wild.3dl --quiet", 0, "", SIZE_WARNING);
+    expect("generate wild.exr wild.blut --quiet", 0, "", WILD_WARNING);
+    expect("generate wild.exr wild.3dl --quiet", 0, "", WILD_WARNING SIZE_WARNING);
     test::expectIn(read("wild.3dl"),
                    "0 1023 \n0 0 1023\n0 0 1023\n0 0 1023\n0 0 1023\n1023 0 1023");
-    expect("generate wild.exr wild.3dl --quiet --no-clamp-output", 0, "", SIZE_WARNING);
+    expect("generate wild.exr wild.3dl --quiet --no-clamp-output", 0, "",
+           WILD_WARNING SIZE_WARNING);
     test::expectIn(read("wild.3dl"), "0 1023 \n0 -2147483648 2147483647\n");
 }
 

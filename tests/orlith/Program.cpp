@@ -83,6 +83,7 @@ void writePattern(const std::string& path, int points,
     };
     writeImage(path, 7 * columns, 7 * Layout::rows(points), [&](int x, int y) {
         const int index = y / 7 * columns + x / 7;
+        if (index >= points * points * points) return look({0, 0, 0});  // padding
         return look({value(index), value(index / points), value(index / points / points)});
     });
 }

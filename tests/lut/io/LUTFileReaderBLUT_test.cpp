@@ -33,8 +33,10 @@ TEST(BLUTReader, ReadsALatticeRedFastestAndACurveOfHalves) {
     const auto lattice = readBytes(".blut", readFile(dataPath("blut/lattice.blut")));
     ASSERT_EQ(lattice->depth(), 2);
     for (int i = 0; i < 8; ++i) {
-        expectRGB(lattice->get(i % 2, i / 2 % 2, i / 4), float(i % 2), float(i / 2 % 2),
-                  float(i / 4) + 0.25F);
+        const int r = i % 2;
+        const int g = i / 2 % 2;
+        const int b = i / 4;
+        expectRGB(lattice->get(r, g, b), float(r), float(g), float(b) + 0.25F);
     }
     // What follows the last sample is not read.
     const auto curve = readBytes(".blut", readFile(dataPath("blut/curve-halves.blut")) + "tail");
