@@ -51,6 +51,10 @@ protected:
     /// The text with which the book refuses data.
     virtual const char* dataError() const = 0;
 
+    /// A line, trimmed, that may be only a part of one; replaced when the whole is there.
+    /// @return false: there is more to come
+    virtual bool isWhole(std::string_view&) { return true; }
+
     /// A line that is nobody's but the format's own: no rule of the above applies to it.
     virtual bool isVerbatim(std::string_view) { return false; }
 
