@@ -3,6 +3,8 @@
 
 #include "lut/io/LUTFileWriterCSP.h"
 
+#include <array>
+
 #include "lut/Exception.h"
 #include "lut/io/Lattice.h"
 #include "lut/io/interchange/ChannelShaper.h"
@@ -59,10 +61,23 @@ void writeShapers(LineWriter& file, const LUT& lut) {
     }
 }
 
-/// As meant: each channel has its own points, and they lead from its domain to 0 to 1.
-void writeChannelShapers(LineWriter& file, const LUT& lut) {
+using ChannelShapers = std::array<ChannelShaper, 3>;
+
+ChannelShapers channelShapers(const LUT& lut) {
+    constexpr float kLastDigit = 0.000001F;  // that the file has
+    ChannelShapers shapers;
     for (unsigned c = 0; c < 3; ++c) {
-        const ChannelShaper shaper = shaperOf(lut, c);
+        shapers[c] = shaperOf(lut, c);
+        if (!shapers[c].rises(kLastDigit)) {
+            throw Exception("unable to write: the inputs of the table do not rise");
+        }
+    }
+    return shapers;
+}
+
+/// As meant: each channel has its own points, and they lead from its domain to 0 to 1.
+void writeChannelShapers(LineWriter& file, const ChannelShapers& shapers) {
+    for (const ChannelShaper& shaper : shapers) {
         if (shaper.isIdentity()) {
             writeIdentityShaper(file);
             continue;
@@ -92,10 +107,11 @@ void writeLattice(LineWriter& file, const LUT& lut) {
 
 void LUTFileWriterCSP::write(const std::string& filename, const boost::shared_ptr<LUT>& lut) {
     if (!isInterchange() && hasShapers(*lut)) expectWritableShapers(*lut);
+    const ChannelShapers shapers = isInterchange() ? channelShapers(*lut) : ChannelShapers();
     LineWriter file(filename, flushesLines(), wroteAll_);
     writeHeader(file, *lut);
     if (isInterchange()) {
-        writeChannelShapers(file, *lut);
+        writeChannelShapers(file, shapers);
     } else if (hasShapers(*lut)) {
         writeShapers(file, *lut);
     } else {

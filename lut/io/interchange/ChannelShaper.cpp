@@ -1,6 +1,7 @@
 #include "lut/io/interchange/ChannelShaper.h"
 
 #include <algorithm>
+#include <cmath>
 #include <cstddef>
 
 #include "lut/CurveLookup.h"
@@ -55,6 +56,13 @@ private:
 };
 
 }  // namespace
+
+bool ChannelShaper::rises(float amount) const {
+    const auto isFinite = [](float number) { return std::isfinite(number); };
+    return std::all_of(inputs.begin(), inputs.end(), isFinite) &&
+           std::all_of(outputs.begin(), outputs.end(), isFinite) &&
+           std::is_sorted(inputs.begin(), inputs.end()) && inputs.back() - inputs.front() >= amount;
+}
 
 ChannelShaper shaperOf(const LUT& lut, unsigned channel) {
     const Domain domain(lut, channel);

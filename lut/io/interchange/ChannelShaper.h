@@ -12,6 +12,10 @@ struct ChannelShaper {
     std::vector<float> inputs;   ///< from the lowest on; two neighbours are equal at a step
     std::vector<float> outputs;  ///< place among the samples, from 0, the first, to 1, the last
 
+    /// Whether the inputs go up, from the first to the last by the given amount at least, to places
+    /// that are numbers.
+    bool rises(float amount) const;
+
     bool isIdentity() const { return inputs.size() == 2 && inputs == outputs; }
 };
 

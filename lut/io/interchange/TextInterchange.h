@@ -83,7 +83,10 @@ protected:
     std::uint64_t sampleCount() const { return reading_.sampleCount; }
 
     void remark(const std::string& kind, const std::string& text) {
-        reading_.remarks.add(kind, lineNumber(), text);
+        remarkAt(lineNumber(), kind, text);
+    }
+    void remarkAt(std::uint64_t line, const std::string& kind, const std::string& text) {
+        reading_.remarks.add(kind, line, text);
     }
 
     /// Fails with a text of the book and its reason.

@@ -137,6 +137,7 @@ Grid3DL ThreeDLInterchange::findGrid(std::string_view line, const Header3DL& hea
     // Three numbers are a sample, or a grid of three points: of 28 lines the first is a grid.
     constexpr std::size_t kGridAndSamples = 28;
     const std::string first(line);
+    const std::uint64_t firstLine = lineNumber();
     const int statedSize = header.pointsPerSide();
     int pointCount = statedSize;
     hold(line, lines);
@@ -150,7 +151,9 @@ Grid3DL ThreeDLInterchange::findGrid(std::string_view line, const Header3DL& hea
         pointCount = countPoints();
     }
     if (pointCount < kFewestPoints) fail(kNoGrid, "a table needs at least 2 points a side");
-    remark("grid", "there is no input grid: the points are taken for even steps from 0 to 1");
+    gridSize_ = static_cast<std::size_t>(pointCount);
+    remarkAt(firstLine, "grid",
+             "there is no input grid: the points are taken for even steps from 0 to 1");
     const bool isCodes = GridLine(first).isCodes() && header.inputBits() == 0;
     return {pointCount, 0.0F, 1.0F, isCodes ? kUsualInputBits : header.inputBits()};
 }
@@ -228,8 +231,9 @@ std::string ThreeDLInterchange::reasonOf(std::string_view message, std::string_v
     if (message == kNotFull) return "the input grid runs from " + gridEnds_;
     if (message == kNotLinear) return "the input grid is not evenly spaced";
     if (message == kWrongSize) {
-        return "the file states " + std::to_string(statedSize_) +
-               " points a side, its input grid has " + std::to_string(gridSize_);
+        if (statedSize_ < 0) return "the Mesh line states a size that no table can have";
+        return "the file states " + std::to_string(statedSize_) + " points a side and has " +
+               std::to_string(gridSize_);
     }
     return "";
 }
