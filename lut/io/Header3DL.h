@@ -6,6 +6,14 @@
 
 namespace Orlith::LUT {
 
+/// The input values of the points along each side.
+struct Grid3DL {
+    int pointCount;
+    float origin;
+    float range;
+    int inputBits;  ///< 0: the file holds floats
+};
+
 /// What the lines above the input grid of a .3dl file state.
 class Header3DL {
 public:
@@ -27,6 +35,9 @@ public:
     Dialect3DL dialect() const { return dialect_; }
     int inputBits() const { return inputBits_; }    ///< 0: not stated
     int outputBits() const { return outputBits_; }  ///< kAsInput: neither wanted nor stated
+
+    /// Points along red, and mostly along every side; 0: not stated.
+    int pointsPerSide() const { return dimensions_[0]; }
 
     /// The caller leaves the output bit depth to the file, and the file does not tell.
     bool lacksOutputBits() const { return wantedOutputBits_ == kDetect && !foundOutputBits_; }

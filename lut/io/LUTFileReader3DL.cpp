@@ -32,6 +32,7 @@
 #include "lut/io/Lattice.h"
 #include "lut/io/RequiredProperty.h"
 #include "lut/io/Warning.h"
+#include "lut/io/interchange/ThreeDLInterchange.h"
 #include "lut/io/text/LineSource.h"
 #include "lut/io/text/Numbers.h"
 #include "lut/io/text/Tokens.h"
@@ -44,14 +45,6 @@ struct Request {
     Dialect3DL dialect;
     int outputBits;
     bool normalizesOutput;
-};
-
-/// The input values of the points along each side.
-struct Grid {
-    int pointCount;
-    float origin;
-    float range;
-    int inputBits;  // 0: the file holds floats
 };
 
 /// How a number of the file becomes a sample.
@@ -87,10 +80,10 @@ bool nextItem(LineSource& lines, std::string_view& item) {
 
 /// Reads as far as the input grid.
 /// @return the grid's line, good until the next one is read
-std::string_view readHeader(LineSource& lines, Header3DL& header) {
+std::string_view readHeader(LineSource& lines, Header3DL& header, ThreeDLInterchange& meant) {
     std::string_view item;
     while (nextItem(lines, item)) {
-        if (!header.take(item)) return item;
+        if (!header.take(item) && !meant.passesOver(item)) return item;
     }
     throw Exception("3DL file reader: syntax error while reading LUT size");
 }
@@ -138,7 +131,7 @@ GridNumbers walkGrid(std::string_view line, float tolerance) {
     return grid;
 }
 
-Grid parseGrid(std::string_view line, const Header3DL& header) {
+Grid3DL parseGrid(std::string_view line, const Header3DL& header) {
     // The first number tells codes from numbers with a point.
     const std::string_view first = Tokens(line)[0];
     const std::size_t point = first.find('.');
@@ -147,7 +140,7 @@ Grid parseGrid(std::string_view line, const Header3DL& header) {
     const auto tolerance = static_cast<float>(isCodes ? 1.0 : 5.0 * std::pow(0.1, digits));
     const auto [count, min, max, isLinear] = walkGrid(line, tolerance);
 
-    Grid grid{count, 0.0F, 1.0F, header.inputBits()};
+    Grid3DL grid{count, 0.0F, 1.0F, header.inputBits()};
     if (isCodes) {
         grid.inputBits = inputBitsOf(min, max);
         if (header.inputBits() != 0 && header.inputBits() != grid.inputBits) {
@@ -176,8 +169,8 @@ Scaling scalingOf(Dialect3DL dialect, int inputBits, int outputBits) {
     return scaling;
 }
 
-void parseSample(std::string_view line, RGB& rgb) {
-    if (parsePlainTriple(line, rgb)) return;
+void parseSample(const LineSource& lines, std::string_view line, RGB& rgb) {
+    if (lines.parseTriple(line, rgb)) return;
     const Tokens words(line);
     if (words.count() != 3) {
         throw Exception("3DL file reader: syntax error while reading LUT data");
@@ -185,16 +178,25 @@ void parseSample(std::string_view line, RGB& rgb) {
     rgb = RGB(toFloat(words[0]), toFloat(words[1]), toFloat(words[2]));
 }
 
+/// The next sample, first of those that had to be read to find the grid.
+/// @return false at the end of the file
+bool nextSample(LineSource& lines, ThreeDLInterchange& meant, RGB& rgb) {
+    if (meant.takeHeld(rgb)) return true;
+    std::string_view item;
+    if (!nextItem(lines, item)) return false;
+    parseSample(lines, item, rgb);
+    return true;
+}
+
 /// Stores the samples that the file has, up to the last point, in its order.
 /// @return the largest number after offset and scale, not below 0
-float readLattice(LineSource& lines, const Scaling& scaling, LUT& lut, std::uint64_t& sampleCount) {
+float readLattice(LineSource& lines, ThreeDLInterchange& meant, const Scaling& scaling, LUT& lut,
+                  std::uint64_t& sampleCount) {
     const std::size_t pointCount = LatticeSize::of(lut).pointCount();
     float* sample = lut.data();
     float largest = 0.0F;
-    std::string_view item;
     RGB rgb;
-    for (; sampleCount < pointCount && nextItem(lines, item); ++sampleCount) {
-        parseSample(item, rgb);
+    for (; sampleCount < pointCount && nextSample(lines, meant, rgb); ++sampleCount) {
         for (unsigned c = 0; c < 3; ++c) {
             const float code = (rgb[c] - scaling.offset) / scaling.scale;
             largest = std::max(largest, code);
@@ -220,12 +222,23 @@ int usualBitsFor(float code) {
     return 0;
 }
 
+/// A dim look is taken for a bright one if its largest code fits fewer bits than it was made for. A
+/// look that reaches the largest code of its bits leaves no doubt.
+void remarkGuess(int bits, float largest, Remarks& remarks) {
+    const int code = toInt32(std::nearbyint(largest));
+    if (bits == 0 || code == codeMaxOf(bits)) return;
+    remarks.add("depth", 0,
+                "the output bit depth is not stated: " + std::to_string(bits) +
+                    " bits are taken, which hold the largest code, " + std::to_string(code));
+}
+
 /// What the samples have still to be multiplied by, now that the largest code is known.
 /// @param usedBits  the output bit depth that they were scaled by
-float laterFactor(const Request& request, const Header3DL& header, const Grid& grid, int usedBits,
-                  float outputMax, float largest) {
+float laterFactor(const Request& request, const Header3DL& header, const Grid3DL& grid,
+                  int usedBits, float outputMax, float largest, Remarks& remarks) {
     if (header.lacksOutputBits() && grid.inputBits != 0) {
         const int bits = usualBitsFor(largest);
+        remarkGuess(bits, largest, remarks);
         if (bits == 0 || bits == usedBits) return 1.0F;
         return outputMax / static_cast<float>(codeMaxOf(bits));
     }
@@ -233,7 +246,7 @@ float laterFactor(const Request& request, const Header3DL& header, const Grid& g
     return isAbove ? outputMax / largest : 1.0F;
 }
 
-void setDomain(LUT& lut, const Grid& grid) {
+void setDomain(LUT& lut, const Grid3DL& grid) {
     const float scale = grid.range / static_cast<float>(grid.pointCount - 1);
     lut.transform.set_identity();
     for (unsigned c = 0; c < 3; ++c) {
@@ -246,26 +259,33 @@ void setDomain(LUT& lut, const Grid& grid) {
 
 boost::shared_ptr<LUT> LUTFileReader3DL::read(const std::string& filename) {
     beginRead();
-    const Request request = findRequest(properties());
+    ThreeDLInterchange meant(reading());
+    const Request request = meant.explainFailures([&] { return findRequest(properties()); });
     std::ifstream file(filename);
-    if (!file) throw Exception("3DL file reader: unable to open file");
-    LineSource lines(file, lineNumber_);
+    if (!file) failToOpen("3DL file reader: unable to open file");
+    LineSource lines(file, lineNumber_, &meant);
+    return meant.explainFailures([&] {
+        Header3DL header(request.dialect, request.outputBits);
+        const std::string_view gridLine = readHeader(lines, header, meant);
+        meant.watchGrid(gridLine, header);
+        const Grid3DL grid =
+            isInterchange() ? meant.findGrid(gridLine, header, lines) : parseGrid(gridLine, header);
+        header.expectSize(grid.pointCount);
+        const int outputBits =
+            header.outputBits() == Header3DL::kAsInput ? grid.inputBits : header.outputBits();
+        const Scaling scaling = scalingOf(header.dialect(), grid.inputBits, outputBits);
 
-    Header3DL header(request.dialect, request.outputBits);
-    const Grid grid = parseGrid(readHeader(lines, header), header);
-    header.expectSize(grid.pointCount);
-    const int outputBits =
-        header.outputBits() == Header3DL::kAsInput ? grid.inputBits : header.outputBits();
-    const Scaling scaling = scalingOf(header.dialect(), grid.inputBits, outputBits);
-
-    lut_ = boost::make_shared<LUT3D>();
-    lut_->resize(grid.pointCount);
-    const float largest = readLattice(lines, scaling, *lut_, sampleCount_);
-    const float factor = laterFactor(request, header, grid, outputBits, scaling.outputMax, largest);
-    if (factor != 1.0F) multiply(*lut_, sampleCount_, factor);
-    placeBlueFastest(*lut_, sampleCount_);
-    setDomain(*lut_, grid);
-    return lut_;
+        lut_ = boost::make_shared<LUT3D>();
+        lut_->resize(grid.pointCount);
+        const float largest = readLattice(lines, meant, scaling, *lut_, sampleCount_);
+        const float factor =
+            laterFactor(request, header, grid, outputBits, scaling.outputMax, largest, remarks_);
+        if (factor != 1.0F) multiply(*lut_, sampleCount_, factor);
+        placeBlueFastest(*lut_, sampleCount_);
+        setDomain(*lut_, grid);
+        meant.finish(*lut_, lines);
+        return lut_;
+    });
 }
 
 }  // namespace Orlith::LUT

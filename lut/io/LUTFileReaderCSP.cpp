@@ -26,6 +26,7 @@
 #include "lut/LUT3D.h"
 #include "lut/io/Lattice.h"
 #include "lut/io/ShaperEntries.h"
+#include "lut/io/interchange/CSPInterchange.h"
 #include "lut/io/text/LineSource.h"
 #include "lut/io/text/Numbers.h"
 #include "lut/io/text/Tokens.h"
@@ -42,7 +43,10 @@ constexpr char kNoMoreEntries[] =
 /// Held by tests/data/read/csp.txt.
 class ItemSource {
 public:
-    ItemSource(std::istream& text, std::uint64_t& lineNumber) : lines_(text, lineNumber) {}
+    ItemSource(std::istream& text, std::uint64_t& lineNumber, LineFilter* filter)
+        : lines_(text, lineNumber, filter) {}
+
+    LineSource& lines() { return lines_; }
 
     /// A line of the header or a shaper, good until the next call. One that ends in a backslash is
     /// no keyword, and the number that it may begin with ends there: what was joined to it counts
@@ -66,7 +70,7 @@ public:
         std::string_view line;
         if (!lines_.next(line)) return false;
         RGB rgb;
-        if (!parsePlainTriple(line, rgb)) {
+        if (!lines_.parseTriple(line, rgb)) {
             if (!join(line)) return false;
             tokens_.split(line);
             tokens_.add(joined_);
@@ -222,18 +226,22 @@ void readLattice(ItemSource& items, LUT& lut, std::uint64_t& sampleCount) {
 boost::shared_ptr<LUT> LUTFileReaderCSP::read(const std::string& filename) {
     beginRead();
     std::ifstream file(filename);
-    if (!file) throw Exception("CSP LUT reader: unable to open file.");
-    ItemSource items(file, lineNumber_);
-
-    expectVersion(items);
-    lut_ = makeTable(items);
-    readShapers(items, *lut_);
-    if (lut_->is1D()) {
-        readCurve(items, *lut_, sampleCount_);
-    } else {
-        readLattice(items, *lut_, sampleCount_);
-    }
-    return lut_;
+    if (!file) failToOpen("CSP LUT reader: unable to open file.");
+    CSPInterchange meant(reading());
+    ItemSource items(file, lineNumber_, &meant);
+    return meant.explainFailures([&] {
+        expectVersion(items);
+        lut_ = makeTable(items);
+        readShapers(items, *lut_);
+        meant.takeShapers(*lut_);
+        if (lut_->is1D()) {
+            readCurve(items, *lut_, sampleCount_);
+        } else {
+            readLattice(items, *lut_, sampleCount_);
+        }
+        meant.expectAllSamples(*lut_, items.lines());
+        return lut_;
+    });
 }
 
 }  // namespace Orlith::LUT

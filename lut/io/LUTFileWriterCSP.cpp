@@ -3,8 +3,11 @@
 
 #include "lut/io/LUTFileWriterCSP.h"
 
+#include <array>
+
 #include "lut/Exception.h"
 #include "lut/io/Lattice.h"
+#include "lut/io/interchange/ChannelShaper.h"
 #include "lut/io/text/LineWriter.h"
 
 namespace Orlith::LUT {
@@ -32,12 +35,10 @@ void writeHeader(LineWriter& file, const LUT& lut) {
     file.endLine();
 }
 
-void writeIdentityShapers(LineWriter& file) {
-    for (int c = 0; c < 3; ++c) {
-        file.text("2").endLine();
-        file.text("0.0 1.0").endLine();
-        file.text("0.0 1.0").endLine();
-    }
+void writeIdentityShaper(LineWriter& file) {
+    file.text("2").endLine();
+    file.text("0.0 1.0").endLine();
+    file.text("0.0 1.0").endLine();
 }
 
 void writeRow(LineWriter& file, const float* numbers, std::size_t count) {
@@ -60,6 +61,33 @@ void writeShapers(LineWriter& file, const LUT& lut) {
     }
 }
 
+using ChannelShapers = std::array<ChannelShaper, 3>;
+
+ChannelShapers channelShapers(const LUT& lut) {
+    constexpr float kLastDigit = 0.000001F;  // that the file has
+    ChannelShapers shapers;
+    for (unsigned c = 0; c < 3; ++c) {
+        shapers[c] = shaperOf(lut, c);
+        if (!shapers[c].rises(kLastDigit)) {
+            throw Exception("unable to write: the inputs of the table do not rise");
+        }
+    }
+    return shapers;
+}
+
+/// As meant: each channel has its own points, and they lead from its domain to 0 to 1.
+void writeChannelShapers(LineWriter& file, const ChannelShapers& shapers) {
+    for (const ChannelShaper& shaper : shapers) {
+        if (shaper.isIdentity()) {
+            writeIdentityShaper(file);
+            continue;
+        }
+        file.integer(static_cast<int>(shaper.inputs.size())).endLine();
+        writeRow(file, shaper.inputs.data(), shaper.inputs.size());
+        writeRow(file, shaper.outputs.data(), shaper.outputs.size());
+    }
+}
+
 void writeCurve(LineWriter& file, const LUT& lut) {
     file.integer(lut.width()).endLine();
     for (int i = 0; i < lut.width(); ++i)
@@ -78,13 +106,17 @@ void writeLattice(LineWriter& file, const LUT& lut) {
 }  // namespace
 
 void LUTFileWriterCSP::write(const std::string& filename, const boost::shared_ptr<LUT>& lut) {
-    if (hasShapers(*lut)) expectWritableShapers(*lut);
+    if (!isInterchange() && hasShapers(*lut)) expectWritableShapers(*lut);
+    const ChannelShapers shapers = isInterchange() ? channelShapers(*lut) : ChannelShapers();
     LineWriter file(filename, flushesLines(), wroteAll_);
     writeHeader(file, *lut);
-    if (hasShapers(*lut)) {
+    if (isInterchange()) {
+        writeChannelShapers(file, shapers);
+    } else if (hasShapers(*lut)) {
         writeShapers(file, *lut);
     } else {
-        writeIdentityShapers(file);
+        for (int c = 0; c < 3; ++c)
+            writeIdentityShaper(file);
     }
     file.endLine();
     if (lut->is1D()) {

@@ -86,6 +86,7 @@ bool TextInterchange::passMeant(std::string_view& line) {
         line.remove_prefix(kByteOrderMark.size());
     }
     line = trim(line);
+    if (!isWhole(line)) return false;
     if (isVerbatim(line)) return true;
     if (line.empty()) return false;
     if (line[0] == '#') return takeComment(line);

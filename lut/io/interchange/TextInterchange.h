@@ -51,6 +51,10 @@ protected:
     /// The text with which the book refuses data.
     virtual const char* dataError() const = 0;
 
+    /// A line, trimmed, that may be only a part of one; replaced when the whole is there.
+    /// @return false: there is more to come
+    virtual bool isWhole(std::string_view&) { return true; }
+
     /// A line that is nobody's but the format's own: no rule of the above applies to it.
     virtual bool isVerbatim(std::string_view) { return false; }
 
@@ -79,7 +83,10 @@ protected:
     std::uint64_t sampleCount() const { return reading_.sampleCount; }
 
     void remark(const std::string& kind, const std::string& text) {
-        reading_.remarks.add(kind, lineNumber(), text);
+        remarkAt(lineNumber(), kind, text);
+    }
+    void remarkAt(std::uint64_t line, const std::string& kind, const std::string& text) {
+        reading_.remarks.add(kind, line, text);
     }
 
     /// Fails with a text of the book and its reason.
