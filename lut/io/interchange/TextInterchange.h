@@ -11,6 +11,12 @@
 
 namespace Orlith::LUT {
 
+/// The inputs that a table covers, each channel's own.
+struct Range {
+    RGB min;
+    RGB max;
+};
+
 /// What other programs' files of a text format are, beside its book.
 ///
 /// Stands between the lines of a file and a reader that goes by the book. By the book it only
@@ -26,6 +32,7 @@ public:
         : reading_(reading), oldTable_(reading.table.get()) {}
 
     bool pass(std::string_view& line) final;
+    bool wantsPlainTriples() const override { return isOver_; }
     void end() final { isAtEnd_ = true; }
 
     /// Runs a reader's work.
@@ -54,7 +61,11 @@ protected:
     /// A line that is nobody's but the format's own: no rule of the above applies to it.
     virtual bool isVerbatim(std::string_view) { return false; }
 
-    /// A line, trimmed, that begins with the comment mark.
+    /// A line, trimmed, that ends the file whatever stands behind it. As meant the reader sees
+    /// neither.
+    virtual bool isEnd(std::string_view) { return false; }
+
+    /// A line, trimmed, that begins with the comment mark, which stands alone: "# comment".
     /// @return whether the reader is to see it
     virtual bool takeComment(std::string_view) { return false; }
 
@@ -77,6 +88,7 @@ protected:
     bool isMeant() const { return reading_.isMeant; }
     std::uint64_t lineNumber() const { return reading_.lineNumber; }
     std::uint64_t sampleCount() const { return reading_.sampleCount; }
+    bool isAtEnd() const { return isAtEnd_; }
 
     void remark(const std::string& kind, const std::string& text) {
         reading_.remarks.add(kind, lineNumber(), text);
@@ -90,17 +102,33 @@ protected:
     /// @throws Exception  the data error
     RGB expectNumbersBehind(std::string_view line, std::size_t count);
 
+    /// Points along a side, or entries: a whole number from 2 on.
+    /// @param message  of the book, for a word that is none
+    int expectSize(std::string_view word, const char* message);
+
+    /// The two numbers behind a keyword as the range of all channels.
+    /// @throws Exception  the data error
+    Range expectRangeBehind(std::string_view line);
+    void expectRising(const Range& range);
+
+    /// Why a file that ends too early fails.
+    /// @param points  of the table; 0: not known
+    std::string endReason(std::uint64_t points) const;
+
 private:
     void explain(const char* message);
     std::string endReason() const;
     bool passMeant(std::string_view& line);
+    void putMarkApart(std::string_view& line);
+    void replaceDecimalCommas(std::string_view& line);
     void expectNumbers(std::string_view line);
 
     Reading reading_;
     const LUT* oldTable_;   // of the read before
     std::string lastLine_;  // that was no triple of plain decimals
     std::uint64_t lastLineNumber_ = 0;
-    std::string rewritten_;  // a line with decimal commas, with points
+    std::string rewritten_;  // a line in the spelling of the book
+    bool isOver_ = false;    // as meant: behind the line that isEnd
     bool isAtEnd_ = false;
     bool isExplained_ = false;
 };
