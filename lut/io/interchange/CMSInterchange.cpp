@@ -11,10 +11,6 @@ constexpr char kPreLUTError[] = "CMS LUT reader: syntax error while reading pre-
 constexpr char kPreLUTEnds[] = "CMS LUT reader: expecting more pre-LUT data.";
 constexpr char kNoTable[] = "CMS LUT reader: failed to read LUT file.";
 
-bool isUnit(const Range& range) {
-    return range.min == RGB(0.0F, 0.0F, 0.0F) && range.max == RGB(1.0F, 1.0F, 1.0F);
-}
-
 }  // namespace
 
 const char* CMSInterchange::dataError() const {

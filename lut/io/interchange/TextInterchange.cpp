@@ -46,13 +46,6 @@ bool beginsWithAWord(std::string_view line) {
     return takeWord(line, word) && isLetter(word[0]) && !isNumber(word);
 }
 
-std::uint64_t pointCount(const LUT& lut) {
-    const auto width = static_cast<std::uint64_t>(lut.width());
-    return lut.is1D() ? width
-                      : width * static_cast<std::uint64_t>(lut.height()) *
-                            static_cast<std::uint64_t>(lut.depth());
-}
-
 }  // namespace
 
 std::string quoted(std::string_view word) {
@@ -68,14 +61,6 @@ std::string quoted(std::string_view word) {
         }
     }
     return text + (word.size() > kMost ? "...\"" : "\"");
-}
-
-void setDomain(LUT& lut, const RGB& min, const RGB& max, const int (&points)[3]) {
-    lut.transform.set_identity();
-    for (unsigned c = 0; c < 3; ++c) {
-        lut.transform[c][c] = (max[c] - min[c]) / static_cast<float>(points[c] - 1);
-        lut.transform[3][c] = min[c];
-    }
 }
 
 bool TextInterchange::pass(std::string_view& line) {
@@ -102,6 +87,7 @@ bool TextInterchange::passMeant(std::string_view& line) {
     }
     isOver_ = isEnd(line);
     if (isOver_) return false;
+    line = trimEnd(line.substr(0, line.find('#')));
     if (line.find(',') != std::string_view::npos) replaceDecimalCommas(line);
     if (beginsWithAWord(line)) return takeKeyword(line);
     expectNumbers(line);
@@ -155,11 +141,7 @@ int TextInterchange::expectSize(std::string_view word, const char* message) {
 }
 
 void TextInterchange::expectRising(const Range& range) {
-    for (unsigned c = 0; c < 3; ++c) {
-        // The distance of the points is a part of it, and has to be a number as well.
-        const float width = range.max[c] - range.min[c];
-        if (!(width > 0.0F) || !std::isnormal(width)) fail(dataError(), "the domain does not rise");
-    }
+    if (!rises(range)) fail(dataError(), "the domain does not rise");
 }
 
 Range TextInterchange::expectRangeBehind(std::string_view line) {
@@ -193,9 +175,7 @@ std::string TextInterchange::endReason() const {
 }
 
 std::string TextInterchange::endReason(std::uint64_t points) const {
-    if (points == 0) return "the file ends here";
-    return "the file ends after " + std::to_string(sampleCount()) + " of " +
-           std::to_string(points) + " samples";
+    return points == 0 ? "the file ends here" : endsEarly(sampleCount(), points);
 }
 
 void TextInterchange::explain(const char* message) {

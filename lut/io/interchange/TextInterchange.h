@@ -7,15 +7,10 @@
 #include "lut/Exception.h"
 #include "lut/LUT.h"
 #include "lut/io/LUTFileReader.h"
+#include "lut/io/interchange/Range.h"
 #include "lut/io/text/LineSource.h"
 
 namespace Orlith::LUT {
-
-/// The inputs that a table covers, each channel's own.
-struct Range {
-    RGB min;
-    RGB max;
-};
 
 /// What other programs' files of a text format are, beside its book.
 ///
@@ -136,9 +131,5 @@ private:
 /// A word as people want to see it: in quotation marks, cut if it is long, control characters as
 /// "\r" and the like.
 std::string quoted(std::string_view word);
-
-/// Gives each channel of a table the domain from min to max.
-/// @param points  along each channel
-void setDomain(LUT& lut, const RGB& min, const RGB& max, const int (&points)[3]);
 
 }  // namespace Orlith::LUT
