@@ -7,11 +7,13 @@
 #include <string>
 
 #include "lut/Exception.h"
-#include "lut/io/interchange/Range.h"
 #include "lut/io/interchange/TextInterchange.h"
+#include "lut/io/interchange/WriteChecks.h"
 
 namespace Orlith::LUT {
 namespace {
+
+constexpr int kBLUTMostPoints = 127;  // the size is a signed byte
 
 [[noreturn]] void fail(const Reading& reading, const std::string& reason) {
     reading.remarks.addLast(0, reason);
@@ -39,8 +41,7 @@ Range rangeOf(const BLUTHeaderBytes& header) {
 }  // namespace
 
 void explainBLUTMagic(const Reading& reading, const BLUTHeaderBytes& header, std::size_t held) {
-    const std::string magic(header.begin(),
-                            header.begin() + std::min(held, std::size(kBLUTMagic)));
+    const std::string magic(header.begin(), header.begin() + std::min(held, std::size(kBLUTMagic)));
     reading.remarks.addLast(
         0, held == 0 ? "the file is empty" : "the file begins with " + quoted(magic));
 }
@@ -69,6 +70,15 @@ void finishBLUT(const Reading& reading, const BLUTHeaderBytes& header, LUT& lut)
     if (!isUnit(range)) {
         reading.remarks.addLast(0, "the range in the header is not used: the table covers 0 to 1");
     }
+}
+
+Range rangeOfBLUT(const LUT& lut) {
+    expectDomain(lut);
+    expectNoPreLUT(lut);
+    if (lut.width() > kBLUTMostPoints) {
+        throw Exception("unable to write: the format has no place for more than 127 points a side");
+    }
+    return coversUnit(lut) ? Range{{0, 0, 0}, {1, 1, 1}} : domainOf(lut);
 }
 
 }  // namespace Orlith::LUT

@@ -4,6 +4,7 @@
 
 #include "lut/io/BLUTLayout.h"
 #include "lut/io/LUTFileReader.h"
+#include "lut/io/interchange/Range.h"
 
 namespace Orlith::LUT {
 
@@ -21,5 +22,9 @@ void expectBLUTSize(const Reading& reading, int size);
 /// Looks at the table that the reader has made.
 /// @throws Exception  as meant: samples are missing, or the range is none
 void finishBLUT(const Reading& reading, const BLUTHeaderBytes& header, LUT& lut);
+
+/// The range that a file's header has for a table: its domain.
+/// @throws Exception  the format cannot hold the table
+Range rangeOfBLUT(const LUT& lut);
 
 }  // namespace Orlith::LUT

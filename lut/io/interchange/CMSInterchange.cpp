@@ -41,7 +41,8 @@ void CMSInterchange::finish(LUT& lut, LineSource& lines) {
     if (!range_) return;
     if (hasPreLUT()) {
         if (!isUnit(*range_)) {
-            remark("range", "the range is not used: the pre-LUT leads to the lattice by itself");
+            remarkAt(0, "range",
+                     "the range is not used: the pre-LUT leads to the lattice by itself");
         }
         return;
     }

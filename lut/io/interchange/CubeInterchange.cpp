@@ -67,10 +67,10 @@ void CubeInterchange::finish(LUT& lut, LineSource& lines) {
                       domainMax_.value_or(RGB(1.0F, 1.0F, 1.0F))};
     }
     if (curveRange_ && curveSize_ == 0) {
-        remark("range", "\"LUT_1D_INPUT_RANGE\" is not used: the file has no 1D block");
+        remarkAt(0, "range", "\"LUT_1D_INPUT_RANGE\" is not used: the file has no 1D block");
     }
     if (latticeRange_ && latticeSize_ == 0) {
-        remark("range", "\"LUT_3D_INPUT_RANGE\" is not used: the file has no 3D block");
+        remarkAt(0, "range", "\"LUT_3D_INPUT_RANGE\" is not used: the file has no 3D block");
     }
     const boost::optional<Range>& domain = lut.is1D() ? curveRange_ : latticeRange_;
     if (domain) {

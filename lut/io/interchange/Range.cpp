@@ -17,6 +17,12 @@ bool isUnit(const Range& range) {
     return range.min == RGB(0.0F, 0.0F, 0.0F) && range.max == RGB(1.0F, 1.0F, 1.0F);
 }
 
+Range domainOf(const LUT& lut) {
+    Range range;
+    lut.minmax(range.min, range.max);
+    return range;
+}
+
 void setDomain(LUT& lut, const RGB& min, const RGB& max, const int (&points)[3]) {
     lut.transform.set_identity();
     for (unsigned c = 0; c < 3; ++c) {
@@ -27,8 +33,7 @@ void setDomain(LUT& lut, const RGB& min, const RGB& max, const int (&points)[3])
 
 bool coversUnit(const LUT& lut) {
     constexpr float kLastBits = 2.5e-7F;  // two units in the last place of 1
-    Range range;
-    lut.minmax(range.min, range.max);
+    const Range range = domainOf(lut);
     for (unsigned c = 0; c < 3; ++c) {
         if (range.min[c] != 0.0F || !(std::fabs(range.max[c] - 1.0F) <= kLastBits)) return false;
     }

@@ -19,6 +19,8 @@ bool rises(const Range& range);
 /// Whether a range is 0 to 1.
 bool isUnit(const Range& range);
 
+Range domainOf(const LUT& lut);
+
 /// Gives each channel of a table the domain from min to max.
 /// @param points  along each channel
 void setDomain(LUT& lut, const RGB& min, const RGB& max, const int (&points)[3]);

@@ -85,9 +85,9 @@ bool TextInterchange::passMeant(std::string_view& line) {
         isOver_ = isEnd(line);
         return !isOver_ && takeComment(line);
     }
+    line = trimEnd(line.substr(0, line.find('#')));
     isOver_ = isEnd(line);
     if (isOver_) return false;
-    line = trimEnd(line.substr(0, line.find('#')));
     if (line.find(',') != std::string_view::npos) replaceDecimalCommas(line);
     if (beginsWithAWord(line)) return takeKeyword(line);
     expectNumbers(line);

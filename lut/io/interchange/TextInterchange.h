@@ -86,7 +86,10 @@ protected:
     bool isAtEnd() const { return isAtEnd_; }
 
     void remark(const std::string& kind, const std::string& text) {
-        reading_.remarks.add(kind, lineNumber(), text);
+        remarkAt(lineNumber(), kind, text);
+    }
+    void remarkAt(std::uint64_t line, const std::string& kind, const std::string& text) {
+        reading_.remarks.add(kind, line, text);
     }
 
     /// Fails with a text of the book and its reason.

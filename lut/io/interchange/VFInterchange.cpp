@@ -94,20 +94,19 @@ void VFInterchange::finish(LUT& lut, LineSource& lines) {
     if (isMeant() && points_ == 0) fail(kDataError, "there is no line grid_size");
     expectAllSamples(lut, lines);
     if (isTurned(lut.transform)) {
-        remark("turned", "what global_transform turns or shears is not used");
+        remarkAt(0, "turned", "what global_transform turns or shears is not used");
     }
     if (!isMeant()) return;
     const LatticeSize size = LatticeSize::of(lut);
     if (!hasPlacement_) {
-        remark("placement", "the file does not place its grid, which is taken to cover 0 to 1");
+        remarkAt(0, "placement",
+                 "the file does not place its grid, which is taken to cover 0 to 1");
     }
     if (!hasPlacement_ || isInStepsOfOneOverN(lut)) {
         setUnitDomain(lut, size.width, size.height, size.depth);
         return;
     }
-    Range range;
-    lut.minmax(range.min, range.max);
-    expectRising(range);
+    expectRising(domainOf(lut));
 }
 
 void VFInterchange::watch(std::string_view line) {
