@@ -1,5 +1,6 @@
 #pragma once
 
+#include <array>
 #include <cstddef>
 #include <cstdint>
 #include <cstdio>
@@ -15,7 +16,8 @@ namespace Orlith::LUT {
 //    4       4     2                the last byte: 1 is a curve, anything else a lattice
 //    8       4     5                ignored
 //   12       4     64               ignored
-//   16      24     0.0F 1.0F        ignored: the range of red, then of green, then of blue
+//   16      24     0.0F 1.0F        ignored: the range of red, then of green, then of blue (as
+//                                   meant: the domain, written as well)
 //   40       3     0                ignored
 //   43       1     points per axis  as a signed byte
 //   44       1     'f'              'h': halves; anything else: floats
@@ -24,8 +26,10 @@ namespace Orlith::LUT {
 // Nothing follows the samples.
 
 constexpr std::size_t kBLUTHeaderBytes = 45;
+using BLUTHeaderBytes = std::array<unsigned char, kBLUTHeaderBytes>;
 constexpr char kBLUTMagic[] = {'H', 'L', 'U', 'T'};
 constexpr std::size_t kBLUTKindOffset = 7;
+constexpr std::size_t kBLUTRangeOffset = 16;
 constexpr std::size_t kBLUTSizeOffset = 43;
 constexpr std::size_t kBLUTTypeOffset = 44;
 

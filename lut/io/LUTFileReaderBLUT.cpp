@@ -6,7 +6,6 @@
 #include <half.h>
 
 #include <algorithm>
-#include <array>
 #include <boost/smart_ptr/make_shared.hpp>
 #include <cstring>
 #include <memory>
@@ -15,6 +14,7 @@
 #include "lut/LUT1D.h"
 #include "lut/LUT3D.h"
 #include "lut/io/BLUTLayout.h"
+#include "lut/io/interchange/BLUTInterchange.h"
 
 namespace Orlith::LUT {
 namespace {
@@ -23,19 +23,21 @@ struct Header {
     bool isCurve;
     bool hasHalves;
     int size;  // points along each axis
+    BLUTHeaderBytes bytes;
 };
 
-Header readHeader(std::FILE* file) {
-    std::array<unsigned char, kBLUTHeaderBytes> bytes;
+Header readHeader(std::FILE* file, const Reading& reading) {
+    BLUTHeaderBytes bytes;
     const std::size_t held = std::fread(bytes.data(), 1, bytes.size(), file);
     std::fill(bytes.begin() + held, bytes.end(), static_cast<unsigned char>(0));
     if (!std::equal(std::begin(kBLUTMagic), std::end(kBLUTMagic), bytes.begin())) {
+        explainBLUTMagic(reading, bytes, held);
         throw Exception("BLUT LUT reader: unsupported header magic number, expected \"HLUT\".");
     }
     // Deliberate: a signed byte, so that 128 to 255 are negative sizes, which no table takes.
     // Held by BLUTReader.TakesTheSizeForASignedByte.
     return {bytes[kBLUTKindOffset] == kBLUTCurve, bytes[kBLUTTypeOffset] == kBLUTHalves,
-            static_cast<std::int8_t>(bytes[kBLUTSizeOffset])};
+            static_cast<std::int8_t>(bytes[kBLUTSizeOffset]), bytes};
 }
 
 boost::shared_ptr<LUT> makeTable(const Header& header) {
@@ -75,14 +77,16 @@ boost::shared_ptr<LUT> LUTFileReaderBLUT::read(const std::string& filename) {
     beginRead();
     const std::unique_ptr<std::FILE, int (*)(std::FILE*)> file(std::fopen(filename.c_str(), "rb"),
                                                                std::fclose);
-    if (!file) throw Exception("BLUT LUT reader: unable to open file.");
+    if (!file) failToOpen("BLUT LUT reader: unable to open file.");
 
-    const Header header = readHeader(file.get());
+    const Header header = readHeader(file.get(), reading());
+    expectBLUTSize(reading(), header.size);
     lut_ = makeTable(header);
     sampleCount_ = header.hasHalves ? readSamples<2, halfToFloat>(file.get(), *lut_)
                                     : readSamples<4, asFloat>(file.get(), *lut_);
     // Whatever range the header says.
     setUnitDomain(*lut_, header.size, header.size, header.size);
+    finishBLUT(reading(), header.bytes, *lut_);
     return lut_;
 }
 

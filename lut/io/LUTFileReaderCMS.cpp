@@ -25,6 +25,7 @@
 #include "lut/LUT3D.h"
 #include "lut/io/Lattice.h"
 #include "lut/io/ShaperEntries.h"
+#include "lut/io/interchange/CMSInterchange.h"
 #include "lut/io/text/LineSource.h"
 #include "lut/io/text/Numbers.h"
 #include "lut/io/text/Tokens.h"
@@ -42,7 +43,7 @@ public:
     bool next(LineSource& lines) {
         std::string_view text;
         while (lines.next(text)) {
-            isPlain_ = parsePlainTriple(text, rgb_);
+            isPlain_ = lines.parseTriple(text, rgb_);
             if (isPlain_) return true;
             tokens_.split(trim(text));
             if (!tokens_.empty()) return true;
@@ -135,23 +136,31 @@ void scalePreLUT(Shaper& shaper, int size) {
 boost::shared_ptr<LUT> LUTFileReaderCMS::read(const std::string& filename) {
     beginRead();
     std::ifstream file(filename);
-    if (!file) throw Exception("CMS LUT reader: unable to open file.");
-    LineSource lines(file, lineNumber_);
+    if (!file) failToOpen("CMS LUT reader: unable to open file.");
+    CMSInterchange meant(reading());
+    LineSource lines(file, lineNumber_, &meant);
+    return meant.explainFailures([&] {
+        readTable(lines, meant);
+        meant.finish(*lut_, lines);
+        return lut_;
+    });
+}
 
+void LUTFileReaderCMS::readTable(LineSource& lines, const CMSInterchange& meant) {
     Line line;
     Sizes sizes;
-    if (findData(lines, line, sizes, lut_)) {
+    bool isData = findData(lines, line, sizes, lut_);
+    if (isData && meant.hasPreLUT()) {
         readPreLUT(lines, line, sizes.preLUT, lut_->outputShaper);
-        LatticePosition point;
-        while (findData(lines, line, sizes, lut_)) {
-            storeSample(*lut_, sizes.lattice, point, line.expectTriple(kDataError));
-            ++sampleCount_;
-        }
+        isData = findData(lines, line, sizes, lut_);
+    }
+    for (LatticePosition point; isData; isData = findData(lines, line, sizes, lut_)) {
+        storeSample(*lut_, sizes.lattice, point, line.expectTriple(kDataError));
+        ++sampleCount_;
     }
     if (!sizes.hasTable()) throw Exception("CMS LUT reader: failed to read LUT file.");
     scalePreLUT(lut_->outputShaper, sizes.lattice);
     setUnitDomain(*lut_, sizes.lattice, sizes.lattice, sizes.lattice);
-    return lut_;
 }
 
 }  // namespace Orlith::LUT

@@ -31,6 +31,7 @@
 #include "lut/LUT3D.h"
 #include "lut/io/Lattice.h"
 #include "lut/io/ShaperEntries.h"
+#include "lut/io/interchange/TruelightInterchange.h"
 #include "lut/io/text/LineSource.h"
 #include "lut/io/text/Numbers.h"
 #include "lut/io/text/Tokens.h"
@@ -118,9 +119,17 @@ bool readData(std::string_view line, Tokens& tokens, Data data, RGB& rgb) {
 boost::shared_ptr<LUT> LUTFileReaderTruelight::read(const std::string& filename) {
     beginRead();
     std::ifstream file(filename);
-    if (!file) throw Exception("Truelight LUT reader: unable to open file.");
-    LineSource lines(file, lineNumber_);
+    if (!file) failToOpen("Truelight LUT reader: unable to open file.");
+    TruelightInterchange meant(reading());
+    LineSource lines(file, lineNumber_, &meant);
+    return meant.explainFailures([&] {
+        const auto lut = readTable(lines);
+        meant.finish(*lut, lines);
+        return lut;
+    });
+}
 
+boost::shared_ptr<LUT> LUTFileReaderTruelight::readTable(LineSource& lines) {
     const auto lut = boost::make_shared<LUT3D>();
     lut_ = lut;
     Cube cube(*lut);
@@ -130,7 +139,7 @@ boost::shared_ptr<LUT> LUTFileReaderTruelight::read(const std::string& filename)
     Tokens tokens;
     RGB rgb;
     while (lines.next(line)) {
-        if (!parsePlainTriple(line, rgb)) {
+        if (!lines.parseTriple(line, rgb)) {
             tokens.split(line);
             if (tokens.empty()) continue;
             if (tokens[0] == "#") {

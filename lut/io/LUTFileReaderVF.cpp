@@ -22,6 +22,7 @@
 #include "lut/Exception.h"
 #include "lut/LUT3D.h"
 #include "lut/io/Lattice.h"
+#include "lut/io/interchange/VFInterchange.h"
 #include "lut/io/text/LineSource.h"
 #include "lut/io/text/Numbers.h"
 #include "lut/io/text/Tokens.h"
@@ -107,7 +108,7 @@ void readSamples(LineSource& lines, LUT3D& lut, std::uint64_t& sampleCount) {
     RGB rgb;
     for (; sampleCount < pointCount; ++sampleCount) {
         const std::string_view line = nextLine(lines);
-        if (!parsePlainTriple(line, rgb)) {
+        if (!lines.parseTriple(line, rgb)) {
             words.split(line);
             if (words.count() != 3) {
                 throw Exception("VF file reader: syntax error while reading LUT data.");
@@ -124,19 +125,22 @@ void readSamples(LineSource& lines, LUT3D& lut, std::uint64_t& sampleCount) {
 boost::shared_ptr<LUT> LUTFileReaderVF::read(const std::string& filename) {
     beginRead();
     std::ifstream file(filename);
-    if (!file) throw Exception("VF file reader: unable to open file.");
+    if (!file) failToOpen("VF file reader: unable to open file.");
     zlib_stream::zip_istream unzipped(file, kWindowSize, kBufferSize, kBufferSize);
     std::istream& text = unzipped.isGzip() ? static_cast<std::istream&>(unzipped) : file;
-    LineSource lines(text, lineNumber_);
-
-    const auto lut = boost::make_shared<LUT3D>();
-    expectHeader(lines);
-    nextLine(lines);  // "SoVectorField {"
-    const Placement placement = readParameters(lines, *lut);
-    readSamples(lines, *lut, sampleCount_);
-    lut->transform = placement.transform();
-    lut_ = lut;
-    return lut;
+    VFInterchange meant(reading());
+    LineSource lines(text, lineNumber_, &meant);
+    return meant.explainFailures([&] {
+        const auto lut = boost::make_shared<LUT3D>();
+        expectHeader(lines);
+        nextLine(lines);  // "SoVectorField {"
+        const Placement placement = readParameters(lines, *lut);
+        readSamples(lines, *lut, sampleCount_);
+        lut->transform = placement.transform();
+        meant.finish(*lut, lines);
+        lut_ = lut;
+        return lut_;
+    });
 }
 
 }  // namespace Orlith::LUT

@@ -12,6 +12,7 @@
 #include "lut/io/BLUTLayout.h"
 #include "lut/io/Lattice.h"
 #include "lut/io/OutputFile.h"
+#include "lut/io/interchange/BLUTInterchange.h"
 
 namespace Orlith::LUT {
 namespace {
@@ -36,12 +37,14 @@ void writeFloats(OutputFile& file, const float* values, std::size_t count) {
     }
 }
 
-void writeHeader(OutputFile& file, int width) {
+void writeHeader(OutputFile& file, int width, const Range& range) {
     file.write(kBLUTMagic, sizeof(kBLUTMagic));
     for (const std::uint32_t word : {2U, 5U, 64U})
         writeWord(file, word);
-    constexpr float kRanges[] = {0.0F, 1.0F, 0.0F, 1.0F, 0.0F, 1.0F};
-    writeFloats(file, kRanges, std::size(kRanges));
+    for (unsigned c = 0; c < 3; ++c) {
+        const float ends[] = {range.min[c], range.max[c]};
+        writeFloats(file, ends, std::size(ends));
+    }
     // Deliberate: the width modulo 256, unchecked; a table too large for the format is written and
     // does not read back. Held by BLUTWriter.WritesTheWidthModulo256.
     writeWord(file, static_cast<std::uint32_t>(width) & 0xFF);
@@ -57,8 +60,9 @@ void LUTFileWriterBLUT::write(const std::string& filename, const boost::shared_p
     if (!lut->is1D() && !size.isCube()) {
         throw Exception("unable to write: must have the same dimension in r, g and b");
     }
+    const Range range = isInterchange() ? rangeOfBLUT(*lut) : Range{{0, 0, 0}, {1, 1, 1}};
     OutputFile file(filename, wroteAll_);
-    writeHeader(file, size.width);
+    writeHeader(file, size.width, range);
     writeFloats(file, lut->data(), 3 * size.pointCount());  // storage has the file's order
 }
 

@@ -5,6 +5,7 @@
 
 #include "lut/Exception.h"
 #include "lut/io/Lattice.h"
+#include "lut/io/interchange/LatticeUnits.h"
 #include "lut/io/text/LineWriter.h"
 
 namespace Orlith::LUT {
@@ -39,9 +40,10 @@ void writeCube(LineWriter& file, const LUT& lut, const LatticeSize& size) {
 void LUTFileWriterTruelight::write(const std::string& filename, const boost::shared_ptr<LUT>& lut) {
     if (lut->is1D()) throw Exception("unable to write: must be a 3D lut");
     const LatticeSize size = LatticeSize::of(*lut);
+    const Shaper inputLUT = isInterchange() ? preLUTOfTruelight(*lut) : lut->outputShaper;
     LineWriter file(filename, flushesLines(), wroteAll_);
     writeHeader(file, size);
-    writeInputLUT(file, lut->outputShaper);
+    writeInputLUT(file, inputLUT);
     writeCube(file, *lut, size);
 }
 

@@ -5,6 +5,7 @@
 
 #include "lut/Exception.h"
 #include "lut/io/Lattice.h"
+#include "lut/io/interchange/WriteChecks.h"
 #include "lut/io/text/LineWriter.h"
 
 namespace Orlith::LUT {
@@ -48,6 +49,11 @@ void LUTFileWriterVF::write(const std::string& filename, const boost::shared_ptr
     if (lut->is1D()) throw Exception("unable to write: must be a 3D lut");
     if (!LatticeSize::of(*lut).isCube()) {
         throw Exception("unable to write: must have the same dimension in r, g and b");
+    }
+    if (isInterchange()) {
+        expectDomain(*lut);
+        expectNoPreLUT(*lut);
+        expectUnitDomain(*lut);
     }
     LineWriter file(filename, flushesLines(), wroteAll_);
     writeHeader(file);

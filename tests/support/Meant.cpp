@@ -20,7 +20,7 @@ ol::RGB evaluated(const boost::shared_ptr<const ol::LUT>& lut, const ol::RGB& in
 }
 
 void expectMeant(const std::string& extension, const ol::RGB& input,
-                 const std::vector<MeantFile>& files, const Prepare& prepare) {
+                 const std::vector<MeantFile>& files, const Reading3DL& prepare) {
     const TempFolder folder;
     for (const MeantFile& file : files) {
         SCOPED_TRACE(file.name);

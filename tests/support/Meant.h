@@ -18,7 +18,7 @@ struct MeantFile {
 };
 
 void expectMeant(const std::string& extension, const ol::RGB& input,
-                 const std::vector<MeantFile>& files, const Prepare& prepare = asItIs);
+                 const std::vector<MeantFile>& files, const Reading3DL& prepare = {});
 
 /// What the Evaluator gives for a colour.
 ol::RGB evaluated(const boost::shared_ptr<const ol::LUT>& lut, const ol::RGB& input);

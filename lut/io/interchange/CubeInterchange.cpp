@@ -12,8 +12,6 @@ constexpr char kDataError[] = "Iridas LUT reader: syntax error while reading LUT
 constexpr char kSizeError[] = "Iridas LUT reader: syntax error while reading LUT size.";
 constexpr char kNoTable[] = "Iridas LUT reader: LUT failed to initialise.";
 
-constexpr int kFewestPoints = 2;  // one point has no slope
-
 }  // namespace
 
 const char* CubeInterchange::dataError() const {
@@ -32,8 +30,7 @@ bool CubeInterchange::takeKeyword(std::string_view line) {
         const bool isCurve = keyword == "LUT_1D_SIZE";
         int& size = isCurve ? curveSize_ : latticeSize_;
         if (size != 0 || sampleCount() > 0) fail(kSizeError, "a second size line");
-        size = toInt(words[1]);
-        if (size < kFewestPoints) fail(kSizeError, "a table needs at least 2 points a side");
+        size = expectSize(words[1], kSizeError);
         // The lattice is the table, and the curve its shaper, whichever comes first.
         return !(isCurve && latticeSize_ > 0);
     }
@@ -42,9 +39,9 @@ bool CubeInterchange::takeKeyword(std::string_view line) {
     } else if (keyword == "DOMAIN_MAX") {
         domainMax_ = expectNumbersBehind(line, 3);
     } else if (keyword == "LUT_1D_INPUT_RANGE") {
-        takeRange(curveRange_, line);
+        curveRange_ = expectRangeBehind(line);
     } else if (keyword == "LUT_3D_INPUT_RANGE") {
-        takeRange(latticeRange_, line);
+        latticeRange_ = expectRangeBehind(line);
     } else {
         remark("unknown", quoted(keyword) + " is not known and not used");
     }
@@ -59,17 +56,6 @@ bool CubeInterchange::takeNumbers(std::string_view line) {
     return false;
 }
 
-void CubeInterchange::takeRange(boost::optional<Range>& range, std::string_view line) {
-    const RGB ends = expectNumbersBehind(line, 2);
-    range = Range{RGB(ends[0], ends[0], ends[0]), RGB(ends[1], ends[1], ends[1])};
-}
-
-void CubeInterchange::expectRising(const Range& range) {
-    for (unsigned c = 0; c < 3; ++c) {
-        if (!(range.min[c] < range.max[c])) fail(kDataError, "the domain does not rise");
-    }
-}
-
 void CubeInterchange::finish(LUT& lut, LineSource& lines) {
     expectAllSamples(lut, lines);
     if (!isMeant()) return;
@@ -80,8 +66,11 @@ void CubeInterchange::finish(LUT& lut, LineSource& lines) {
         first = Range{domainMin_.value_or(RGB(0.0F, 0.0F, 0.0F)),
                       domainMax_.value_or(RGB(1.0F, 1.0F, 1.0F))};
     }
-    if (!lut.is1D() && !hasShaper && curveRange_) {
-        remark("range", "\"LUT_1D_INPUT_RANGE\" is not used: the file has no 1D block");
+    if (curveRange_ && curveSize_ == 0) {
+        remarkAt(0, "range", "\"LUT_1D_INPUT_RANGE\" is not used: the file has no 1D block");
+    }
+    if (latticeRange_ && latticeSize_ == 0) {
+        remarkAt(0, "range", "\"LUT_3D_INPUT_RANGE\" is not used: the file has no 3D block");
     }
     const boost::optional<Range>& domain = lut.is1D() ? curveRange_ : latticeRange_;
     if (domain) {
@@ -119,7 +108,7 @@ void CubeInterchange::watch(std::string_view line) {
 std::string CubeInterchange::reasonOf(std::string_view message, std::string_view lastLine) {
     const Tokens words(lastLine);
     if (message == kSizeError) return quoted(words[1]) + " is no size";
-    if (message == kNoTable && lastLine.empty()) {
+    if (message == kNoTable && isAtEnd()) {
         return "there is no line LUT_1D_SIZE or LUT_3D_SIZE";
     }
     return "";

@@ -34,14 +34,6 @@ protected:
     std::string reasonOf(std::string_view message, std::string_view lastLine) override;
 
 private:
-    struct Range {
-        RGB min;
-        RGB max;
-    };
-
-    void takeRange(boost::optional<Range>& range, std::string_view line);
-    void expectRising(const Range& range);
-
     int curveSize_ = 0;  // of the latest size lines; 0: none
     int latticeSize_ = 0;
     boost::optional<RGB> domainMin_;

@@ -40,11 +40,10 @@ bool hasDecimalComma(std::string_view word) {
            word.find(',', comma + 1) == std::string_view::npos;
 }
 
-std::uint64_t pointCount(const LUT& lut) {
-    const auto width = static_cast<std::uint64_t>(lut.width());
-    return lut.is1D() ? width
-                      : width * static_cast<std::uint64_t>(lut.height()) *
-                            static_cast<std::uint64_t>(lut.depth());
+/// Whether the first word of a line begins with a letter and is no number, as "inf" is.
+bool beginsWithAWord(std::string_view line) {
+    std::string_view word;
+    return takeWord(line, word) && isLetter(word[0]) && !isNumber(word);
 }
 
 }  // namespace
@@ -64,15 +63,8 @@ std::string quoted(std::string_view word) {
     return text + (word.size() > kMost ? "...\"" : "\"");
 }
 
-void setDomain(LUT& lut, const RGB& min, const RGB& max, const int (&points)[3]) {
-    lut.transform.set_identity();
-    for (unsigned c = 0; c < 3; ++c) {
-        lut.transform[c][c] = (max[c] - min[c]) / static_cast<float>(points[c] - 1);
-        lut.transform[3][c] = min[c];
-    }
-}
-
 bool TextInterchange::pass(std::string_view& line) {
+    if (isOver_) return false;
     constexpr std::size_t kMostKept = 200;
     lastLine_.assign(line.substr(0, kMostKept));
     lastLineNumber_ = lineNumber();
@@ -89,24 +81,35 @@ bool TextInterchange::passMeant(std::string_view& line) {
     if (!isWhole(line)) return false;
     if (isVerbatim(line)) return true;
     if (line.empty()) return false;
-    if (line[0] == '#') return takeComment(line);
-    std::string_view rest = line;
-    std::string_view word;
-    takeWord(rest, word);
-    if (isLetter(word[0]) && !isNumber(word)) return takeKeyword(line);
-
-    if (line.find(',') != std::string_view::npos) {
-        rewritten_.clear();
-        for (rest = line; takeWord(rest, word);) {
-            if (!rewritten_.empty()) rewritten_ += ' ';
-            const std::size_t start = rewritten_.size();
-            rewritten_ += word;
-            if (hasDecimalComma(word)) rewritten_[rewritten_.find(',', start)] = '.';
-        }
-        line = rewritten_;
+    if (line[0] == '#') {
+        putMarkApart(line);
+        isOver_ = isEnd(line);
+        return !isOver_ && takeComment(line);
     }
+    line = trimEnd(line.substr(0, line.find('#')));
+    isOver_ = isEnd(line);
+    if (isOver_) return false;
+    if (line.find(',') != std::string_view::npos) replaceDecimalCommas(line);
+    if (beginsWithAWord(line)) return takeKeyword(line);
     expectNumbers(line);
     return takeNumbers(line);
+}
+
+void TextInterchange::putMarkApart(std::string_view& line) {
+    if (line.size() == 1 || line[1] == ' ' || line[1] == '\t') return;
+    rewritten_.assign("# ").append(line.substr(1));
+    line = rewritten_;
+}
+
+void TextInterchange::replaceDecimalCommas(std::string_view& line) {
+    rewritten_.clear();
+    for (std::string_view rest = line, word; takeWord(rest, word);) {
+        if (!rewritten_.empty()) rewritten_ += ' ';
+        const std::size_t start = rewritten_.size();
+        rewritten_ += word;
+        if (hasDecimalComma(word)) rewritten_[rewritten_.find(',', start)] = '.';
+    }
+    line = rewritten_;
 }
 
 void TextInterchange::expectNumbers(std::string_view line) {
@@ -126,6 +129,27 @@ RGB TextInterchange::expectNumbersBehind(std::string_view line, std::size_t coun
                               std::to_string(words.count()));
     }
     return {toFloat(words[0]), toFloat(words[1]), toFloat(words[2])};
+}
+
+int TextInterchange::expectSize(std::string_view word, const char* message) {
+    constexpr int kFewestPoints = 2;  // one point has no slope
+    if (word.empty() || !std::all_of(word.begin(), word.end(), isDigit) || word.size() > 9) {
+        fail(message, quoted(word) + " is no size");
+    }
+    const int size = toInt(word);
+    if (size < kFewestPoints) fail(message, "a table needs at least 2 points a side");
+    return size;
+}
+
+void TextInterchange::expectRising(const Range& range) {
+    if (!rises(range)) fail(dataError(), "the domain does not rise");
+}
+
+Range TextInterchange::expectRangeBehind(std::string_view line) {
+    const RGB ends = expectNumbersBehind(line, 2);
+    const Range range{RGB(ends[0], ends[0], ends[0]), RGB(ends[1], ends[1], ends[1])};
+    expectRising(range);
+    return range;
 }
 
 void TextInterchange::expectAllSamples(const LUT& lut, LineSource& lines) {
@@ -148,10 +172,11 @@ void TextInterchange::fail(const char* message, const std::string& reason) {
 
 std::string TextInterchange::endReason() const {
     const bool hasTable = reading_.table && reading_.table.get() != oldTable_;
-    const std::uint64_t points = hasTable ? pointCount(*reading_.table) : 0;
-    if (points == 0) return "the file ends here";
-    return "the file ends after " + std::to_string(sampleCount()) + " of " +
-           std::to_string(points) + " samples";
+    return endReason(hasTable ? pointCount(*reading_.table) : 0);
+}
+
+std::string TextInterchange::endReason(std::uint64_t points) const {
+    return points == 0 ? "the file ends here" : endsEarly(sampleCount(), points);
 }
 
 void TextInterchange::explain(const char* message) {
@@ -165,7 +190,8 @@ void TextInterchange::explain(const char* message) {
         reason = "the file begins with a byte order mark";
     }
     if (reason.empty() && lastLine_ == "\r") reason = "the line holds only a carriage return";
-    if (reason.empty() && lastLine_.size() > 1 && lastLine_[0] == '#') {
+    const bool isComment = lastLine_.size() > 1 && lastLine_[0] == '#';
+    if (reason.empty() && (isComment || beginsWithAWord(lastLine_))) {
         std::string_view rest = lastLine_;
         std::string_view word;
         takeWord(rest, word);

@@ -7,6 +7,7 @@
 #include "lut/Exception.h"
 #include "lut/LUT.h"
 #include "lut/io/LUTFileReader.h"
+#include "lut/io/interchange/Range.h"
 #include "lut/io/text/LineSource.h"
 
 namespace Orlith::LUT {
@@ -26,6 +27,7 @@ public:
         : reading_(reading), oldTable_(reading.table.get()) {}
 
     bool pass(std::string_view& line) final;
+    bool wantsPlainTriples() const override { return isOver_; }
     void end() final { isAtEnd_ = true; }
 
     /// Runs a reader's work.
@@ -58,7 +60,11 @@ protected:
     /// A line that is nobody's but the format's own: no rule of the above applies to it.
     virtual bool isVerbatim(std::string_view) { return false; }
 
-    /// A line, trimmed, that begins with the comment mark.
+    /// A line, trimmed, that ends the file whatever stands behind it. As meant the reader sees
+    /// neither.
+    virtual bool isEnd(std::string_view) { return false; }
+
+    /// A line, trimmed, that begins with the comment mark, which stands alone: "# comment".
     /// @return whether the reader is to see it
     virtual bool takeComment(std::string_view) { return false; }
 
@@ -81,6 +87,7 @@ protected:
     bool isMeant() const { return reading_.isMeant; }
     std::uint64_t lineNumber() const { return reading_.lineNumber; }
     std::uint64_t sampleCount() const { return reading_.sampleCount; }
+    bool isAtEnd() const { return isAtEnd_; }
 
     void remark(const std::string& kind, const std::string& text) {
         remarkAt(lineNumber(), kind, text);
@@ -97,17 +104,33 @@ protected:
     /// @throws Exception  the data error
     RGB expectNumbersBehind(std::string_view line, std::size_t count);
 
+    /// Points along a side, or entries: a whole number from 2 on.
+    /// @param message  of the book, for a word that is none
+    int expectSize(std::string_view word, const char* message);
+
+    /// The two numbers behind a keyword as the range of all channels.
+    /// @throws Exception  the data error
+    Range expectRangeBehind(std::string_view line);
+    void expectRising(const Range& range);
+
+    /// Why a file that ends too early fails.
+    /// @param points  of the table; 0: not known
+    std::string endReason(std::uint64_t points) const;
+
 private:
     void explain(const char* message);
     std::string endReason() const;
     bool passMeant(std::string_view& line);
+    void putMarkApart(std::string_view& line);
+    void replaceDecimalCommas(std::string_view& line);
     void expectNumbers(std::string_view line);
 
     Reading reading_;
     const LUT* oldTable_;   // of the read before
     std::string lastLine_;  // that was no triple of plain decimals
     std::uint64_t lastLineNumber_ = 0;
-    std::string rewritten_;  // a line with decimal commas, with points
+    std::string rewritten_;  // a line in the spelling of the book
+    bool isOver_ = false;    // as meant: behind the line that isEnd
     bool isAtEnd_ = false;
     bool isExplained_ = false;
 };
@@ -115,9 +138,5 @@ private:
 /// A word as people want to see it: in quotation marks, cut if it is long, control characters as
 /// "\r" and the like.
 std::string quoted(std::string_view word);
-
-/// Gives each channel of a table the domain from min to max.
-/// @param points  along each channel
-void setDomain(LUT& lut, const RGB& min, const RGB& max, const int (&points)[3]);
 
 }  // namespace Orlith::LUT

@@ -31,4 +31,8 @@ char* writeFixed(char* out, float value) {
     return out + 6;
 }
 
+char* writeShortest(char* out, float value) {
+    return std::to_chars(out, out + kShortestLength, value, std::chars_format::fixed).ptr;
+}
+
 }  // namespace Orlith::LUT

@@ -75,6 +75,12 @@ LineWriter& LineWriter::integerTriple(const int* rgb) {
     return *this;
 }
 
+LineWriter& LineWriter::shortestTriple(const float* rgb) {
+    char* const start = reserve(3 * kShortestLength + 2);
+    length_ += static_cast<std::size_t>(writeTriple(start, rgb, writeShortest) - start);
+    return *this;
+}
+
 void LineWriter::endLine() {
     *reserve(1) = '\n';
     ++length_;

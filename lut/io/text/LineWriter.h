@@ -29,6 +29,8 @@ public:
     /// Three numbers separated by single blanks.
     LineWriter& fixedTriple(const float* rgb);
     LineWriter& integerTriple(const int* rgb);
+    /// The same with all the digits that the numbers have.
+    LineWriter& shortestTriple(const float* rgb);
 
     void endLine();
 

@@ -1,0 +1,151 @@
+// What is written as meant, other programs read as the table's look: here, by our own readers.
+
+#include <gtest/gtest.h>
+
+#include <boost/smart_ptr/make_shared.hpp>
+#include <functional>
+
+#include "lut/Evaluator.h"
+#include "lut/io/Registry.h"
+#include "lut/property/PropertySet.h"
+#include "tests/support/Files.h"
+#include "tests/support/Tables.h"
+
+namespace {
+
+namespace ol = Orlith::LUT;
+namespace property = Orlith::Property;
+
+constexpr char kNoPlace[] = "unable to write: the format has no place for the pre-LUT";
+constexpr char kNoDomain[] = "unable to write: the format has no place for a domain but 0 to 1";
+constexpr char kNoCurve[] = "unable to write: must be a 3D lut";
+
+template <class Face>
+void goAsMeant(Face& face) {
+    face.setProperty("interchange", property::makeProperty<property::Int>("interchange", 1));
+}
+
+/// Writes a table and compares the look of the file with its own, between -0.5 and 2.5.
+/// @return the message of a refusal, or ""
+std::string keepsTheLook(const std::string& extension, const boost::shared_ptr<ol::LUT>& table) {
+    const test::TempFolder folder;
+    const std::string file = folder.path("table");
+    const auto writer = ol::createWriter("", true, extension);
+    const auto reader = ol::createReader("", true, extension);
+    goAsMeant(*writer);
+    goAsMeant(*reader);
+    const std::string refusal = test::messageOf([&] { writer->write(file, table); });
+    if (refusal != "(no exception)") return refusal;
+    const ol::Evaluator before(table);
+    const ol::Evaluator after(reader->read(file));
+    EXPECT_TRUE(reader->remarks().empty());
+    for (int i = 0; i < 50; ++i) {
+        const auto step = static_cast<float>(i);
+        const ol::RGB in(-.5F + step * .06F, 2.5F - step * .06F, step * .02F);
+        ol::RGB expected;
+        ol::RGB out;
+        before.apply(in.data_block(), expected.data_block(), 1);
+        after.apply(in.data_block(), out.data_block(), 1);
+        for (unsigned c = 0; c < 3; ++c)
+            EXPECT_NEAR(out[c], expected[c], 2e-6F) << "channel " << c << " of " << in;
+    }
+    return "";
+}
+
+struct Kind {
+    const char* name;
+    boost::shared_ptr<ol::LUT> table;
+    // What each format says: "" where it holds the table.
+    const char* cube;
+    const char* blut;
+    const char* cms;
+    const char* cub;
+    const char* vf;
+};
+
+boost::shared_ptr<ol::LUT> lattice(const std::function<void(ol::LUT&)>& change) {
+    const auto table = test::markedLattice(5, 5, 5);
+    ol::setUnitDomain(*table, 5, 5, 5);
+    change(*table);
+    return table;
+}
+
+void setShaper(ol::Shaper& shaper, const std::vector<ol::RGB>& entries) {
+    shaper.entries = entries;
+    shaper.counts.fill(static_cast<float>(entries.size()));
+}
+
+void widenDomain(ol::LUT& table) {
+    for (unsigned c = 0; c < 3; ++c) {
+        table.transform[c][c] = .3F + .1F * static_cast<float>(c);
+        table.transform[3][c] = -.1F * static_cast<float>(c);
+    }
+}
+
+TEST(WrittenAsMeant, KeepsTheLookOrSaysWhyNot) {
+    const std::vector<ol::RGB> ramp{{0, 0, 0}, {.5F, .5F, .5F}, {1, 1, 1}};
+    const std::vector<ol::RGB> bend{{0, 0, 0}, {.2F, .5F, .7F}, {1, .9F, 1.1F}};
+    const auto curve = test::markedCurve(5);
+    widenDomain(*curve);
+    const Kind kinds[] = {
+        {"lattice", lattice([](ol::LUT&) {}), "", "", "", "", ""},
+        {"domain", lattice(widenDomain), "", "", kNoDomain, kNoDomain, kNoDomain},
+        {"pre-LUT", lattice([&](ol::LUT& t) { setShaper(t.outputShaper, bend); }), kNoPlace,
+         kNoPlace, "", "", kNoPlace},
+        {"pre-LUT that changes nothing", lattice([&](ol::LUT& t) {
+             setShaper(t.inputShaper, ramp);
+             setShaper(t.outputShaper, ramp);
+         }),
+         "", "", "", "", ""},
+        {"pre-LUT into a domain", lattice([&](ol::LUT& t) {
+             widenDomain(t);
+             setShaper(t.outputShaper, bend);
+         }),
+         kNoPlace, kNoPlace, "", "", kNoPlace},
+        {"uneven inputs", lattice([&](ol::LUT& t) { setShaper(t.inputShaper, bend); }), kNoPlace,
+         kNoPlace, kNoPlace, kNoPlace, kNoPlace},
+        {"curve", curve, "", "height: not available", kNoCurve, kNoCurve, kNoCurve},
+    };
+    for (const Kind& kind : kinds) {
+        SCOPED_TRACE(kind.name);
+        EXPECT_EQ(keepsTheLook(".cube", kind.table), kind.cube);
+        EXPECT_EQ(keepsTheLook(".blut", kind.table), kind.blut);
+        EXPECT_EQ(keepsTheLook(".cms", kind.table), kind.cms);
+        EXPECT_EQ(keepsTheLook(".cub", kind.table), kind.cub);
+        EXPECT_EQ(keepsTheLook(".vf", kind.table), kind.vf);
+    }
+}
+
+TEST(WrittenAsMeant, HasTheDomainBehindTheSize) {
+    const auto curve = test::markedCurve(2);
+    curve->transform[0][0] = .1F;
+    curve->transform[3][1] = -1e-7F;
+    const test::TempFolder folder;
+    const auto writer = ol::createWriter("", true, ".cube");
+    goAsMeant(*writer);
+    writer->write(folder.path("table"), curve);
+    EXPECT_EQ(test::readFile(folder.path("table")),
+              "TITLE \"Generated by Orlith::LUT\"\nLUT_1D_SIZE 2\nDOMAIN_MIN 0 -0.0000001 0\n"
+              "DOMAIN_MAX 0.1 0.9999999 1\n0.000000 0.100000 0.200000\n"
+              "0.000100 0.100100 0.200100\n");
+}
+
+TEST(WrittenAsMeant, HasPreLUTsInUnitsOfTheLattice) {
+    const auto table = lattice([](ol::LUT& t) {
+        setShaper(t.outputShaper, {{0, 0, 0}, {1, 1, .5F}});
+    });
+    const test::TempFolder folder;
+    const auto linesOf = [&](const char* extension, const char* first) {
+        const auto writer = ol::createWriter("", true, extension);
+        goAsMeant(*writer);
+        writer->write(folder.path("table"), table);
+        const std::string text = test::readFile(folder.path("table"));
+        return text.substr(text.find(first), 55 + std::string(first).size());
+    };
+    EXPECT_EQ(linesOf(".cub", "# InputLUT\n"),
+              "# InputLUT\n0.000000 0.000000 0.000000\n4.000000 4.000000 2.000000\n\n");
+    EXPECT_EQ(linesOf(".cms", "LUT_3D_SIZE 5\n"),
+              "LUT_3D_SIZE 5\n0.000000 0.000000 0.000000\n5.000000 5.000000 2.500000\n\n");
+}
+
+}  // namespace
