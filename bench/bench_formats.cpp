@@ -36,10 +36,11 @@ boost::shared_ptr<ol::LUTFileWriter> makeWriter(const std::string& extension, bo
     return writer;
 }
 
-boost::shared_ptr<ol::LUTFileReader> makeReader(const std::string& extension) {
+boost::shared_ptr<ol::LUTFileReader> makeReader(const std::string& extension, bool isMeant) {
     auto reader = ol::createReader("", true, extension);
     const auto set = [&](const char* name, auto value) { reader->setProperty(name, value); };
     set("format3DL", property::makeProperty<property::String>("format3DL", "auto"));
+    set("interchange", property::makeProperty<property::Int>("interchange", isMeant ? 1 : 0));
     set("outputBitDepth", property::makeProperty<property::Int>("outputBitDepth", -2));
     set("normalizeOutput", property::makeProperty<property::Int>("normalizeOutput", 0));
     return reader;
@@ -106,10 +107,10 @@ void writeRaw(benchmark::State& state) {
 
 // Reading
 
-void read(benchmark::State& state, const std::string& extension) {
+void read(benchmark::State& state, const std::string& extension, bool isMeant) {
     const bench::ScratchFile file(extension);
     makeWriter(extension, false)->write(file.path(), bench::look(static_cast<int>(state.range(0))));
-    const auto reader = makeReader(extension);
+    const auto reader = makeReader(extension, isMeant);
     for (auto _ : state)
         benchmark::DoNotOptimize(reader->read(file.path()));
     countPoints(state);
@@ -153,7 +154,7 @@ void readCompressed(benchmark::State& state) {
     const gzFile out = gzopen(compressed.path().c_str(), "wb");
     gzwrite(out, bytes.data(), static_cast<unsigned>(bytes.size()));
     gzclose(out);
-    const auto reader = makeReader(".vfz");
+    const auto reader = makeReader(".vfz", false);
     for (auto _ : state)
         benchmark::DoNotOptimize(reader->read(compressed.path()));
     countPoints(state);
@@ -191,13 +192,14 @@ int main(int argc, char** argv) {
         add("write" + extension + "/blocks", [=](State& s) { write(s, extension, false); });
         add("write" + extension + "/blocks_plain",
             [=](State& s) { writePlain(s, extension, endGathered); });
-        add("read" + extension, [=](State& s) { read(s, extension); });
+        add("read" + extension, [=](State& s) { read(s, extension, false); });
+        add("read" + extension + "/meant", [=](State& s) { read(s, extension, true); });
         add("read" + extension + "/plain", [=](State& s) { readPlain(s, extension); });
     }
     add("read.vfz", readCompressed);
     add("write.blut", [](benchmark::State& s) { write(s, ".blut", true); });
     add("write.blut/plain", writeRaw);
-    add("read.blut", [](benchmark::State& s) { read(s, ".blut"); });
+    add("read.blut", [](benchmark::State& s) { read(s, ".blut", false); });
     add("read.blut/plain", readRaw);
 
     benchmark::Initialize(&argc, argv);

@@ -2,6 +2,7 @@
 // writer either refuses the table or writes a file that its reader takes, with the same samples as
 // far as the format keeps them.
 
+#include <algorithm>
 #include <cmath>
 #include <cstdio>
 #include <cstdlib>
@@ -29,6 +30,12 @@ std::size_t pointCount(const ol::LUT& lut) {
                       : ol::LatticeSize::of(lut).pointCount();
 }
 
+bool isFinite(const ol::LUT& lut) {
+    const float* const samples = lut.data();
+    return std::all_of(samples, samples + 3 * pointCount(lut),
+                       [](float sample) { return std::isfinite(sample); });
+}
+
 bool isNear(float a, float b) {
     if (a == b || (std::isnan(a) && std::isnan(b))) return true;
     const auto read = static_cast<double>(a);
@@ -42,8 +49,9 @@ void check(bool isRight, const std::string& extension, const char* what) {
     std::abort();
 }
 
-void setWriterOptions(ol::LUTFileWriter& writer) {
+void setWriterOptions(ol::LUTFileWriter& writer, fuzz::Mode mode) {
     const auto set = [&](const char* name, auto value) { writer.setProperty(name, value); };
+    set("interchange", fuzz::interchange(mode));
     set("inputBitDepth", property::makeProperty<property::Int>("inputBitDepth", 10));
     set("outputBitDepth", property::makeProperty<property::Int>("outputBitDepth", 12));
     set("clampOutput", property::makeProperty<property::Int>("clampOutput", 0));
@@ -58,9 +66,9 @@ bool readsBack(const std::string& extension, const ol::LUT& lut) {
 }
 
 void writeAndRead(const boost::shared_ptr<ol::LUT>& lut, const std::string& extension,
-                  const fuzz::MemoryFile& file) {
+                  const fuzz::MemoryFile& file, fuzz::Mode mode) {
     const auto writer = ol::createWriter("", true, extension);
-    setWriterOptions(*writer);
+    setWriterOptions(*writer, mode);
     try {
         writer->write(file.path(), lut);
     } catch (const ol::Exception&) {
@@ -68,7 +76,7 @@ void writeAndRead(const boost::shared_ptr<ol::LUT>& lut, const std::string& exte
     }
     if (!readsBack(extension, *lut)) return;
     const auto reader = ol::createReader("", true, extension);
-    fuzz::setReaderOptions(*reader, 0, 0);
+    fuzz::setReaderOptions(*reader, 0, 0, mode);
     boost::shared_ptr<ol::LUT> back;
     try {
         back = reader->read(file.path());
@@ -90,7 +98,8 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* bytes, std::size_t byt
     if (byteCount == 0) return 0;
     const std::size_t format = bytes[byteCount - 1] % (kWritableFormats + 1);
     const auto reader = ol::createReader("", true, kFormats[format]);
-    fuzz::setReaderOptions(*reader, bytes[byteCount - 1], 0);
+    const fuzz::Mode mode = fuzz::modeOf(bytes[byteCount - 1] / 8);
+    fuzz::setReaderOptions(*reader, bytes[byteCount - 1], 0, mode);
     input.hold(bytes, byteCount);
     boost::shared_ptr<ol::LUT> lut;
     try {
@@ -103,7 +112,9 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* bytes, std::size_t byt
         return 0;
     }
     if (pointCount(*lut) == 0 || pointCount(*lut) > kMostPoints) return 0;
+    // As meant, a text with an infinite sample is no table.
+    if (mode == fuzz::Mode::Meant && !isFinite(*lut)) return 0;
     for (std::size_t i = 0; i < kWritableFormats; ++i)
-        writeAndRead(lut, kFormats[i], output);
+        writeAndRead(lut, kFormats[i], output, mode);
     return 0;
 }

@@ -9,6 +9,8 @@
 namespace Orlith::LUT {
 namespace {
 
+constexpr char kNotHeld[] = "unable to write: the format has no place for the pre-LUT";
+
 /// Inputs reach the outputShaper as they are, and it has as many points on each channel.
 bool isHeld(const LUT& lut) {
     const Shaper& shaper = lut.outputShaper;
@@ -16,6 +18,14 @@ bool isHeld(const LUT& lut) {
     return (lut.inputShaper.empty() || isRamp(lut.inputShaper)) && count >= 2.0F &&
            count <= static_cast<float>(shaper.entries.size()) && shaper.counts[1] == count &&
            shaper.counts[2] == count;
+}
+
+void expectFinite(const Shaper& shaper) {
+    for (const RGB& entry : shaper.entries) {
+        for (unsigned c = 0; c < 3; ++c) {
+            if (!std::isfinite(entry[c])) throw Exception(kNotHeld);
+        }
+    }
 }
 
 }  // namespace
@@ -27,16 +37,15 @@ Shaper preLUTOfTruelight(const LUT& lut) {
         expectUnitDomain(lut);
         return {};
     }
-    constexpr char kNotHeld[] = "unable to write: the format has no place for the pre-LUT";
     if (!isHeld(lut)) throw Exception(kNotHeld);
     Shaper shaper = lut.outputShaper;
     shaper.entries.resize(static_cast<std::size_t>(shaper.counts[0]));
     for (RGB& entry : shaper.entries) {
         for (unsigned c = 0; c < 3; ++c) {
             entry[c] = (entry[c] - lut.transform[3][c]) / lut.transform[c][c];
-            if (!std::isfinite(entry[c])) throw Exception(kNotHeld);
         }
     }
+    expectFinite(shaper);
     return shaper;
 }
 
@@ -51,6 +60,7 @@ Shaper preLUTOfCMS(const LUT& lut) {
         for (unsigned c = 0; c < 3; ++c)
             entry[c] = entry[c] * points / (points - 1.0F);
     }
+    expectFinite(shaper);
     return shaper;
 }
 
