@@ -72,8 +72,8 @@ bool hasEqualSides(const ol::LUT& lut) {
 }
 
 std::string domainText(const Domain& domain) {
-    return fmt::format("{} to {}", colourText(domain.min.data_block()),
-                       colourText(domain.max.data_block()));
+    return fmt::format("{:.6g} {:.6g} {:.6g} to {:.6g} {:.6g} {:.6g}", domain.min[0], domain.min[1],
+                       domain.min[2], domain.max[0], domain.max[1], domain.max[2]);
 }
 
 /// Why a format cannot hold a table as it is; empty if it can.

@@ -140,8 +140,27 @@ void printText(const Table& table, const InfoOptions& options) {
     }
 }
 
+/// Reads a table as meant; one whose file ends early by the book, so that there is something to
+/// look at.
+Table readAsFarAsItGoes(const std::string& path, const ReadOptions& options) {
+    try {
+        return readTableAndWarn(path, options);
+    } catch (const Failure& failure) {
+        ReadOptions byBook = options;
+        byBook.isStrict = true;
+        Table table;
+        try {
+            if (!options.isStrict && path != "-") table = readTable(path, byBook);
+        } catch (const Failure&) {
+        }
+        if (!table.lut || table.isFilled()) throw;
+        warn(failure.what());
+        return table;
+    }
+}
+
 int runInfo(const InfoOptions& options) {
-    const Table table = readTableAndWarn(options.path, options.reading);
+    const Table table = readAsFarAsItGoes(options.path, options.reading);
     if (options.showsValues && table.pointCount > kMostValues) {
         throw Failure(fmt::format("{}: {} points are too many for --values (at most {})",
                                   table.name, table.pointCount, kMostValues));

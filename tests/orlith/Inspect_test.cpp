@@ -24,7 +24,7 @@ TEST_F(InspectTest, InfoTellsAPersonWhatIsInAFile) {
               "from identity   1 at most\n"
               "monotone        red yes, green yes, blue yes\n");
     folder_.write("curve", "LUT_1D_SIZE 3\n0 1 nan\n0.1 0.25 nan\n1 0.5 nan\n");
-    EXPECT_EQ(output("info curve --from cube --values"),
+    EXPECT_EQ(output("info curve --from cube --values --strict"),
               "file            curve\n"
               "format          .cube\n"
               "table           1D, 3 entries\n"
@@ -45,7 +45,7 @@ TEST_F(InspectTest, InfoPrintsOneJsonObject) {
                   "CSPLUTV100\n3D\n\n2\n0 1\n0 0.5\n3\n0 0.25 1\n0 1e-7 1\n2\n-inf 1\n0 nan\n\n"
                   "1 1 2\n0.1 0.2 0.3\n-nan inf 16777216\n");
     EXPECT_EQ(
-        output("info --json --values " + name),
+        output("info --json --values --strict " + name),
         "{\"file\": \"a\\\"\\\\\\n\xc3\xa9\xef\xbf\xbd.csp\", \"format\": \".csp\", \"kind\": "
         "\"3D\", \"size\": [1, 1, 2],\n"
         " \"samples_read\": 2,\n"
@@ -55,28 +55,32 @@ TEST_F(InspectTest, InfoPrintsOneJsonObject) {
         " 1], [1, 1, 1]]}, \"outputShaper\": {\"counts\": [2, 3, 2], \"entries\": [[0, 0, 0],"
         " [0.5, 1e-07, \"nan\"], [0.5, 1, \"nan\"]]},\n"
         " \"range\": {\"min\": [0.1, 0.2, 0.3], \"max\": [0.1, \"inf\", 16777216]},\n"
+        " \"remarks\": [],\n"
         " \"values\": [[0.1, 0.2, 0.3], [\"nan\", \"inf\", 16777216]]}\n");
 }
 
 TEST_F(InspectTest, TinyFilesWithHugeClaimsAreAnsweredAtOnce) {
     folder_.write("claim.cube", "LUT_3D_SIZE 400\n0 0 0\n");
     folder_.write("surplus.cub", "# width 1 1 1\n0 0 0\n1 1 1\n");
-#define WARNING "orlith: warning: claim.cube: holds 1 samples, its table has 64000000 points\n"
+#define REASON                                                                                   \
+    "claim.cube:2: Iridas LUT reader: syntax error while reading LUT data. (the file ends after" \
+    " 1 of 64000000 samples)\n"
     const test::Outcome json = run("info claim.cube --json");
     EXPECT_EQ(json.status, 0);
-    EXPECT_EQ(json.err, WARNING);
+    EXPECT_EQ(json.err, "orlith: warning: " REASON);
     test::expectIn(json.out, "\"samples_read\": 1,\n");
-    test::expectIn(json.out, "\"range\": null}\n");
+    test::expectIn(json.out, "\"range\": null,\n");
     expectAll({
         {"info claim.cube --values", 1, "",
-         WARNING "orlith: error: claim.cube: 64000000 points are too many for --values (at most"
-                 " 16777216)\n"},
-        {"eval claim.cube 1 1 1 --strict", 0, "0 0 0\n", WARNING},
-        {"eval claim.cube 1 1 1", 1, "",
+         "orlith: warning: " REASON
+         "orlith: error: claim.cube: 64000000 points are too many for --values (at most"
+         " 16777216)\n"},
+        {"eval claim.cube 1 1 1 --strict", 0, "0 0 0\n",
+         "orlith: warning: claim.cube: holds 1 samples, its table has 64000000 points\n"},
+        {"eval claim.cube 1 1 1", 1, "", "orlith: error: " REASON},
+        {"diff claim.cube surplus.cub --strict", 1, "",
          "orlith: error: claim.cube: holds 1 samples, its table has 64000000 points\n"},
-        {"diff claim.cube surplus.cub", 1, "",
-         "orlith: error: claim.cube: holds 1 samples, its table has 64000000 points\n"},
-        {"eval surplus.cub 0 0 0", 0, "1 1 1\n",
+        {"eval surplus.cub 0 0 0 --strict", 0, "1 1 1\n",
          "orlith: warning: surplus.cub: holds 2 samples, its table has 1 points\n"},
     });
 }
@@ -87,13 +91,13 @@ TEST_F(InspectTest, InfoReadsA3dlFileAsItIsTold) {
     const struct {
         const char *options, *range;
     } kCases[] = {
-        {"", "0 0 0 to 0.24926686 0.24926686 0.29325515"},  // 300 takes ten bits
+        {" --strict", "0 0 0 to 0.24926686 0.24926686 0.29325515"},  // 300 takes ten bits
         {" --read-output-bitdepth 8 --normalize-output", "0 0 0 to 0.85 0.85 1.0000001"},
         {" --read-output-bitdepth input --read-format-3dl scratch",
          "-0.060036387 -0.060036387 -0.060036387 to 0.9605822 0.9605822 1.1406913"},
     };
     for (const auto& each : kCases)
-        test::expectIn(output(std::string("info a.3dl") + each.options),
+        test::expectIn(run(std::string("info a.3dl") + each.options).out,
                        std::string("\nrange           ") + each.range + "\n");
 }
 
@@ -104,13 +108,17 @@ TEST_F(InspectTest, EvalSendsColoursThroughATable) {
         {"eval a.cube 0.25 0.75 1 --mode step", 0, "0 0 0.25\n", ""},
         {"eval a.cube 0.25 0.5 0.5 --mode staggered", 0, "0.5 0.25 0.25\n", ""},
         {"eval a.cube --extrapolate -0.5 0 0", 0, "0 -0.5 0.5\n", ""},
-        {"eval a.cube 1e-60 +1 1e60", 0, "nan nan nan\n", ""},
+        {"eval a.cube 0.25 0.5 0.75 --mode tetrahedral", 0, "0.5 0.25 0.3125\n", ""},
+        {"eval a.cube 0 0 0 --mode tetrahedral --strict", 2, "",
+         "orlith: error: --mode tetrahedral does not go with --strict\n"},
+        {"eval a.cube 1e-60 +1 1e60", 0, "1 0 0.25\n", ""},
+        {"eval a.cube 1e-60 +1 1e60 --strict", 0, "nan nan nan\n", ""},
         {"eval a.cube 1 1 0x1", 2, "", "orlith: error: \"0x1\" is not a number\n"},
     });
     EXPECT_EQ(output("eval - 0.25 0.5 0.5 --from .CUBE", kLattice), "0.5 0.25 0.375\n");
     EXPECT_EQ(output("eval a.cube", ""), "");
     EXPECT_EQ(output("eval a.cube", "0 0 0\r\n\n \t1\t0.25 +1e0 \n-1 5 nan"),
-              "0 0 0.5\n0.25 1 0.25\nnan nan nan\n");
+              "0 0 0.5\n0.25 1 0.25\n1 0 0.5\n");
     for (const std::string line : {"1 2", "1 2 3 4", "1 2 3x"}) {
         const test::Outcome outcome = run("eval a.cube", "0 0 0\n\n" + line + "\n1 1 1\n");
         EXPECT_EQ(outcome.status, 1) << line;
@@ -121,8 +129,8 @@ TEST_F(InspectTest, EvalSendsColoursThroughATable) {
 
 /// What diff prints.
 std::string table(const std::string& red, const std::string& green, const std::string& blue) {
-    return "               largest          mean           rms\nred     " + red + "\ngreen   " +
-           green + "\nblue    " + blue + "\n";
+    return "               largest          mean           rms  largest at\nred     " + red +
+           "\ngreen   " + green + "\nblue    " + blue + "\n";
 }
 
 TEST_F(InspectTest, DiffComparesTables) {
@@ -130,29 +138,49 @@ TEST_F(InspectTest, DiffComparesTables) {
     folder_.write("b.cube", test::replaced(kLattice, "0 0 0.25", "0.5 0 0.5"));
     folder_.write("curve2.cube", "LUT_1D_SIZE 2\n0 0 0\n1 1 1\n");
     folder_.write("curve3.cube", "LUT_1D_SIZE 3\n0 0 0\n0.5 0.5 0.75\n1 1 1\n");
+    folder_.write("wide3.cube", "LUT_1D_SIZE 3\nDOMAIN_MAX 2 2 2\n0 0 0\n1 1 1\n2 2 2\n");
     folder_.write("nan.cube", "LUT_1D_SIZE 2\n0 0 0\n1 nan 1\n");
-    const std::string none = "             0             0             0";
+    const std::string none = "             0             0             0  -";
     const std::string all = table(none, none, none);
-    const std::string some = table("           0.5        0.0625      0.176777", none,
-                                   "          0.25       0.03125     0.0883883");
-    const std::string bent = table(none, none, "          0.25     0.0833333      0.144338");
-    const std::string wild = table(none, "           inf           inf           inf", none);
+    const std::string some = table("           0.5        0.0625      0.176777  0 0 1", none,
+                                   "          0.25       0.03125     0.0883883  0 0 1");
+    const std::string bent =
+        table(none, none, "          0.25     0.0833333      0.144338  0.5 0.5 0.5");
+    const std::string wild = table(none, "           inf           inf           inf  1 1 1", none);
     expectAll({
-        {"diff nan.cube nan.cube", 0, all.c_str(), ""},  // NaN equals NaN, but nothing else
-        {"diff nan.cube curve2.cube --tolerance 9e99", 1, wild.c_str(), ""},
-        {"diff a.cube b.cube", 1, some.c_str(), ""},
-        {"diff a.cube b.cube --tolerance 0.5", 0, some.c_str(), ""},
-        {"diff a.cube b.cube --tolerance 0.4999", 1, some.c_str(), ""},
+        // By the book: sample by sample. NaN equals NaN, but nothing else.
+        {"diff nan.cube nan.cube --strict", 0, all.c_str(), ""},
+        {"diff nan.cube curve2.cube --tolerance 9e99 --strict", 1, wild.c_str(), ""},
+        {"diff a.cube b.cube --strict", 1, some.c_str(), ""},
+        {"diff a.cube b.cube --tolerance 0.5 --strict", 0, some.c_str(), ""},
+        {"diff a.cube b.cube --tolerance 0.4999 --strict", 1, some.c_str(), ""},
         // Of other size: at the points of the larger, whichever comes first.
-        {"diff curve2.cube curve3.cube", 1, bent.c_str(), ""},
-        {"diff curve3.cube curve2.cube", 1, bent.c_str(), ""},
+        {"diff curve2.cube curve3.cube --strict", 1, bent.c_str(), ""},
+        {"diff curve3.cube curve2.cube --strict", 1, bent.c_str(), ""},
         {"diff a.cube none", 1, "",
          "orlith: error: none: No reader found for extension \"\". (name the format by --from)\n"},
     });
+    // Looks: at the points of the larger and at random colours.
+    const struct {
+        const char *command, *part;
+        int status;
+    } kLooks[] = {
+        {"diff a.cube b.cube", "red                0.5     0.06", 1},
+        {"diff curve2.cube curve3.cube", "  0.5 0.5 0.5\n", 1},
+        {"diff a.cube b.cube --tolerance 0.5", "  0 0 1\n", 0},
+        {"diff a.cube b.cube --json", "\"red\": {\"largest\": 0.5, \"at\": [0, 0, 1], ", 1},
+        // Clamped at 1 and straight on to 2: apart by 1 where the wider one ends.
+        {"diff curve2.cube wide3.cube --tolerance 0.9999", "  2 2 2\n", 1},
+        {"diff curve2.cube wide3.cube --tolerance 1", "  2 2 2\n", 0},
+        // A curve against a lattice with red and green swapped.
+        {"diff a.cube curve2.cube --tolerance 1", "  1 0 0\n", 0},
+    };
+    for (const auto& each : kLooks) {
+        const test::Outcome outcome = run(each.command);
+        EXPECT_EQ(outcome.status, each.status) << each.command;
+        test::expectIn(outcome.out, each.part);
+    }
     EXPECT_EQ(run("diff - b.cube --from cube", read("b.cube")).status, 0);
-    // A curve against a lattice with red and green swapped.
-    EXPECT_EQ(run("diff a.cube curve2.cube --tolerance 1").status, 0);
-    EXPECT_EQ(run("diff a.cube curve2.cube --tolerance 0.9").status, 1);
 }
 
 }  // namespace

@@ -28,8 +28,7 @@ TEST_F(ScriptTest, RunSaysWhatIsWrong) {
     folder_.write("alone.tcl", "GenerateLUT {file grade.cube}\n");
     folder_.write("empty.tcl", "CMSTestPattern {size 2}\nGenerateLUT {lut1d 2}\n");
     std::filesystem::create_symlink("/dev/full", folder_.path("full.csp"));
-    folder_.write("full.tcl",
-                  "CMSTestPattern {size 2}\nGenerateLUT {file full.csp}");
+    folder_.write("full.tcl", "CMSTestPattern {size 2}\nGenerateLUT {file full.csp}");
     folder_.write("bad.tcl", "\nGenerateLUT {lut1d many}\n");
     expectAll({
         {"run none.tcl", 1, "", "orlith: error: none.tcl: cannot be read\n"},

@@ -79,7 +79,7 @@ void CubeInterchange::finish(LUT& lut, LineSource& lines) {
         setDomain(lut, domain->min, domain->max, {size, size, size});
     }
     if (!hasShaper) return;
-    if (curveRange_) {
+    if (curveRange_ && !isUnit(*curveRange_)) {
         expectRising(*curveRange_);
         lut.inputShaper.entries = {curveRange_->min, curveRange_->max};
         lut.inputShaper.counts.fill(2.0F);
