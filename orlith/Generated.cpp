@@ -6,6 +6,7 @@
 #include <boost/smart_ptr/make_shared.hpp>
 
 #include "lut/LUT3D.h"
+#include "lut/io/Registry.h"
 #include "orlith/Look.h"
 #include "orlith/Messages.h"
 #include "orlith/TableFile.h"
@@ -61,11 +62,13 @@ void warnOfOtherLook(const Generated& file, const std::string& extension,
     const double deviation = largestOf(comparison.finish());
     constexpr double kFormatPrecision = 1e-5;
     if (!(deviation > kFormatPrecision)) return;
+    std::string base;
+    Orlith::LUT::splitExtension(file.name, &base, nullptr);
     warn(fmt::format(
-        "{}: programs that read {} files see a look that is off by {:.2g}: the operator's pre-LUT"
-        " from 0 to 1 reaches the first cell of the lattice only; write a .cube file and \"orlith"
-        " convert\" that to {}",
-        file.name, extension, deviation, extension));
+        "{0}: programs that read {1} files see a look that is off by {2:.2g}: the operator's"
+        " pre-LUT from 0 to 1 reaches the first cell of the lattice only; generate {3}.cube and"
+        " make it by \"orlith convert {3}.cube {0}\"",
+        file.name, extension, deviation, base));
 }
 
 }  // namespace

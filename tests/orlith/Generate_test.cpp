@@ -14,12 +14,12 @@ namespace fs = std::filesystem;
     "orlith: warning: wild.exr: 16 of 24 samples are not finite, the first in the patch at x" \
     " 0 and y 0 from the bottom left (a division by zero, the logarithm of a negative number?)\n"
 
-#define OTHER_LOOK(extension, deviation)                                                   \
-    "orlith: warning: o" extension ": programs that read " extension                       \
-    " files see a look that is off by " deviation                                          \
-    ": the operator's pre-LUT from 0 to 1 reaches"                                         \
-    " the first cell of the lattice only; write a .cube file and \"orlith convert\" that " \
-    "to " extension "\n"
+#define OTHER_LOOK(extension, deviation)                                                          \
+    "orlith: warning: o" extension ": programs that read " extension                              \
+    " files see a look that is off by " deviation                                                 \
+    ": the operator's pre-LUT from 0 to 1 reaches"                                                \
+    " the first cell of the lattice only; generate o.cube and make it by \"orlith convert o.cube" \
+    " o" extension "\"\n"
 
 class GenerateTest : public test::ProgramTest {
 protected:
