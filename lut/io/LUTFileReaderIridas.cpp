@@ -95,7 +95,7 @@ boost::shared_ptr<LUT> LUTFileReaderIridas::read(const std::string& filename) {
     CubeInterchange meant(reading());
     LineSource lines(file, lineNumber_, &meant);
     return meant.explainFailures([&] {
-        const auto lut = readTable(lines);
+        auto lut = readTable(lines);
         meant.finish(*lut, lines);
         return lut;
     });

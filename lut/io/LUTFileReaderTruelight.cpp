@@ -123,7 +123,7 @@ boost::shared_ptr<LUT> LUTFileReaderTruelight::read(const std::string& filename)
     TruelightInterchange meant(reading());
     LineSource lines(file, lineNumber_, &meant);
     return meant.explainFailures([&] {
-        const auto lut = readTable(lines);
+        auto lut = readTable(lines);
         meant.finish(*lut, lines);
         return lut;
     });

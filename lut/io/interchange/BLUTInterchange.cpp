@@ -30,8 +30,8 @@ float bigEndianFloat(const unsigned char* bytes) {
 
 Range rangeOf(const BLUTHeaderBytes& header) {
     Range range;
-    for (unsigned c = 0; c < 3; ++c) {
-        const unsigned char* const ends = header.data() + kBLUTRangeOffset + 8 * c;
+    const unsigned char* ends = header.data() + kBLUTRangeOffset;
+    for (unsigned c = 0; c < 3; ++c, ends += 8) {
         range.min[c] = bigEndianFloat(ends);
         range.max[c] = bigEndianFloat(ends + 4);
     }

@@ -34,7 +34,7 @@ std::string keepsTheLook(const std::string& extension, const boost::shared_ptr<o
     const auto reader = ol::createReader("", true, extension);
     goAsMeant(*writer);
     goAsMeant(*reader);
-    const std::string refusal = test::messageOf([&] { writer->write(file, table); });
+    std::string refusal = test::messageOf([&] { writer->write(file, table); });
     if (refusal != "(no exception)") return refusal;
     const ol::Evaluator before(table);
     const ol::Evaluator after(reader->read(file));
