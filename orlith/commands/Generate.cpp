@@ -14,6 +14,7 @@
 #include "orlith/OutputFile.h"
 #include "orlith/PatternReading.h"
 #include "orlith/TableFile.h"
+#include "orlith/Verification.h"
 #include "orlith/WriteOptions.h"
 
 namespace orlith {
@@ -128,7 +129,10 @@ int runGenerate(const GenerateOptions& options) {
     for (const std::string& text : pattern.warnings)
         warn(text);
 
-    OutputFile output(generate.value("file"));
+    const std::string path = generate.value("file");
+    const std::string unreadable = whyUnreadable(formatWritten(generate, path), *pattern.table);
+    if (!unreadable.empty()) throw Failure(fmt::format("{}: {}", path, unreadable));
+    OutputFile output(path);
     setStage(generate, output);
     execute(generate, output);
     const std::string line = reportGenerated(
