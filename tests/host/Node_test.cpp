@@ -57,9 +57,7 @@ TEST_F(NodeTest, RefusesTextThatDoesNotFit) {
         const char *control, *text, *failure;
     } kCases[] = {
         {"foo", "1", "GenerateLUT1: no control named \"foo\""},
-        {"", "1", "GenerateLUT1: no control named \"\""},
         {"format_3dl_id", "-1", "GenerateLUT1.format_3dl_id: \"-1\" is not on the menu" FORMATS},
-        {"format_3dl_id", "", "GenerateLUT1.format_3dl_id: \"\" is not on the menu" FORMATS},
         {"format_3dl_id", "3", "GenerateLUT1.format_3dl_id: \"3\" is not on the menu" FORMATS},
         {"file_type", ".xyz",
          "GenerateLUT1.file_type: \".xyz\" is not on the menu: (blank), .3dl, .blut, .cms, .csp, "
