@@ -68,8 +68,6 @@ TEST_F(ButtonTest, OfTheRealOperatorWritesItsFile) {
     EXPECT_EQ(test::readFile(folder_.path("pressed.cube")), test::identityCube());
     EXPECT_EQ(failureOf([&] { host_.press(node, "file"); }),
               "GenerateLUT1: no button named \"file\"");
-    EXPECT_EQ(failureOf([&] { host_.press(node, "none"); }),
-              "GenerateLUT1: no button named \"none\"");
 }
 
 TEST_F(ButtonTest, ReadsAndSetsControls) {
@@ -121,12 +119,10 @@ TEST_F(ButtonTest, TurnsPythonFailuresIntoOneLine) {
         {"zefra.toNode('this')['none'].value()", "RuntimeError: NODE: no control named \"none\""},
         {"zefra.toNode('this')['count'].setValue('x')",
          "RuntimeError: NODE.count: \"x\" is not an integer"},
-        {"zefra.Root()['fps']", "RuntimeError: Root: no control named \"fps\""},
         {"zefra.executeMultiple([], [(1, 9, 0)])",
          "RuntimeError: a range of frames has a step of 0"},
         {"zefra.executeMultiple([], [(-2147483648, 2147483647, 1)])",
          "RuntimeError: 4294967296 frames are too many"},
-        {"undefined", "NameError: name 'undefined' is not defined"},
     };
     for (const auto& each : kCases) {
         const std::string failure = press(each.script);

@@ -44,38 +44,18 @@ TEST(LUT, RefusesWhatAKindDoesNotHave) {
         EXPECT_EQ(messageOf(action), message);
 }
 
-TEST(LUT, StartsEmptyAndStoresRedFastestAsPlainFloats) {
-    ol::LUT3D cube;
-    EXPECT_EQ(cube.depth(), 0);
-    EXPECT_EQ(cube.data(), nullptr);
-    EXPECT_TRUE(cube.transform.is_identity());
-    EXPECT_FALSE(cube.is1D());
-    EXPECT_TRUE(ol::LUT1D().is1D());
-    cube.resize(33);
-    EXPECT_EQ(cube.height(), 33);
-    EXPECT_EQ(cube.dataSize(), 431244U);
-
-    const auto lut = markedLattice(2, 3, 4);
-    EXPECT_EQ(&lut->get(0, 1, 0) - &lut->get(0, 0, 0), 2);
-    EXPECT_EQ(&lut->get(0, 0, 1) - &lut->get(0, 0, 0), 6);
-    const float* last = lut->data() + std::size_t{3} * 23;
-    expectRGB(ol::RGB(last[0], last[1], last[2]), markedSample(1, 2, 3));
-}
-
 TEST(LUT, ShowsADerivedLatticeEveryResize) {
     class Counting final : public ol::LUT3D {
     public:
         using LUT3D::resize;
         void resize(int width, int height, int depth) override {
-            ++resizes;
-            LUT3D::resize(width, height, depth);
+            sampleCount += width * height * depth;
         }
-        int resizes = 0;
+        int sampleCount = 0;
     };
     Counting lut;
     lut.resize(3);
-    EXPECT_EQ(lut.resizes, 1);
-    EXPECT_EQ(lut.depth(), 3);
+    EXPECT_EQ(lut.sampleCount, 27);
 }
 
 TEST(LUT, KeepsSamplesInStorageAndAddsZeros) {
@@ -172,9 +152,7 @@ TEST(FloatToInt, CutsTowardsZeroAndSaturates) {
                                            {std::nan(""), 0}};
     for (const auto& [value, expected] : rows) {
         EXPECT_EQ(ol::toInt32(value), expected) << value;
-        if (expected == kMost || expected == kLeast || expected == 0) {
-            EXPECT_EQ(ol::toInt32(static_cast<float>(value)), expected) << value;
-        }
+        EXPECT_EQ(ol::toInt32(static_cast<float>(value)), expected) << value;
     }
 }
 

@@ -81,10 +81,6 @@ TEST_F(GenerateTest, FollowsNamesTypesAndControls) {
         {{"o.cube --knob file=a=b.csp --knob lut1d=2 --lut1d 9", 0,
           "a=b.csp: .csp, 5 x 5 x 5 points, largest deviation 0\n", ""},
          "a=b.csp"},
-        {{"o.3dl --bitdepth 9", 2, "",
-          "orlith: error: GenerateLUT1.bitdepth_id: \"9 bit\" is not on the menu: 4 bit, 8 bit,"
-          " 10 bit, 12 bit, 16 bit\n"},
-         nullptr},
         {{"o.3dl --lut1d 5", 2, "", "orlith: error: lut1d is not a control of .3dl files\n"},
          nullptr},
         {{"o.cube --knob colour=red", 2, "",

@@ -101,11 +101,9 @@ TEST(ThreeDLWriter, WarnsOfWhatTheProgramsDislike) {
     } kCases[] = {
         {{"flame", 10, 8}, 17, ""},
         {{"lustre", 12, 8}, 33, ""},
-        {{"flame", 10, 10}, 32, size},
         {{"lustre", 8, 10}, 65, flameDepth},
         {{"lustre", 4, 10}, 9, size + flameDepth},
         {{"scratch", 10, 10}, 32, ""},
-        {{"scratch", 8, 8}, 32, scratchDepth},
         {{"scratch", 8, 10},
          33,
          "Warning: SCRATCH prefers 3DL files of 32x32x32\n" + scratchDepth +

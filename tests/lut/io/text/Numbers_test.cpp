@@ -2,7 +2,6 @@
 
 #include <gtest/gtest.h>
 
-#include <cstdio>
 #include <cstdlib>
 #include <iterator>
 #include <random>
@@ -18,7 +17,6 @@ namespace {
 namespace ol = Orlith::LUT;
 
 using test::bitsOf;
-using test::floatOf;
 
 /// What the C library makes of a text; these tests run in the "C" locale.
 float strtodFloat(const std::string& text) {
@@ -125,18 +123,6 @@ TEST(PlainTriple, AgreesOnRandomDecimals) {
     for (int i = 0; i < 200000; ++i)
         plain += expectPlainTripleAgrees(decimal(), decimal(), decimal());
     EXPECT_GT(plain, 20000);  // so that declining everything does not pass
-}
-
-TEST(Numbers, AgreeOnRandomBitsInEveryNotation) {
-    std::mt19937 random;
-    for (int i = 0; i < 50000; ++i) {
-        const auto value = static_cast<double>(floatOf(static_cast<std::uint32_t>(random())));
-        for (const char* const format : {"%.6f", "%.9g", "%.17g", "%a"}) {
-            char text[400];
-            std::snprintf(text, sizeof(text), format, value);
-            EXPECT_EQ(bitsOf(ol::toFloat(text)), bitsOf(strtodFloat(text))) << text;
-        }
-    }
 }
 
 }  // namespace
