@@ -60,16 +60,6 @@ protected:
     host::Node* node_ = nullptr;
 };
 
-TEST_F(ButtonTest, OfTheRealOperatorWritesItsFile) {
-    host::Node& node = generator();
-    node.setValue("file", folder_.path("pressed.cube"));
-    host_.press(node, "generate");
-    EXPECT_TRUE(node.takeErrors().empty());
-    EXPECT_EQ(test::readFile(folder_.path("pressed.cube")), test::identityCube());
-    EXPECT_EQ(failureOf([&] { host_.press(node, "file"); }),
-              "GenerateLUT1: no button named \"file\"");
-}
-
 TEST_F(ButtonTest, ReadsAndSetsControls) {
     EXPECT_EQ(press("node = zefra.toNode('this')\n"
                     "assert node.name() == 'Button1'\n"

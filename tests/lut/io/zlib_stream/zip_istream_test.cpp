@@ -50,16 +50,11 @@ TEST(ZipIstream, ReadsTextOfManyRefillsWithBuffersOfAnySize) {
 }
 
 TEST(ZipIstream, LeavesASourceThatIsNotCompressedWhereItStood) {
-    const TempFolder folder;
     for (const std::string bytes : {"plain text", "\x1F", "\x1Fyes", "\x1F\x1F\x8B", "\x8B\x1F"}) {
-        std::istringstream memory(bytes);
-        std::ifstream file(folder.write("plain", bytes));
-        for (std::istream* const source :
-             {static_cast<std::istream*>(&memory), static_cast<std::istream*>(&file)}) {
-            EXPECT_FALSE(zip_istream(*source, 15, 4096, 4096).isGzip());
-            EXPECT_TRUE(source->good());
-            EXPECT_EQ(rest(*source), bytes);
-        }
+        std::istringstream plain(bytes);
+        EXPECT_FALSE(zip_istream(plain, 15, 4096, 4096).isGzip());
+        EXPECT_TRUE(plain.good());
+        EXPECT_EQ(rest(plain), bytes);
     }
     std::istringstream empty("");
     EXPECT_FALSE(zip_istream(empty, 15, 4096, 4096).isGzip());
