@@ -2,11 +2,9 @@
 
 #include <gtest/gtest.h>
 
-#include <fstream>
 #include <iterator>
 #include <sstream>
 
-#include "tests/support/Files.h"
 #include "tests/support/Gzip.h"
 
 namespace {
