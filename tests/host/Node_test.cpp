@@ -57,9 +57,7 @@ TEST_F(NodeTest, RefusesTextThatDoesNotFit) {
         const char *control, *text, *failure;
     } kCases[] = {
         {"foo", "1", "GenerateLUT1: no control named \"foo\""},
-        {"", "1", "GenerateLUT1: no control named \"\""},
         {"format_3dl_id", "-1", "GenerateLUT1.format_3dl_id: \"-1\" is not on the menu" FORMATS},
-        {"format_3dl_id", "", "GenerateLUT1.format_3dl_id: \"\" is not on the menu" FORMATS},
         {"format_3dl_id", "3", "GenerateLUT1.format_3dl_id: \"3\" is not on the menu" FORMATS},
         {"file_type", ".xyz",
          "GenerateLUT1.file_type: \".xyz\" is not on the menu: (blank), .3dl, .blut, .cms, .csp, "
@@ -71,9 +69,6 @@ TEST_F(NodeTest, RefusesTextThatDoesNotFit) {
     node.setValue("file_type", ".3dl");
     for (const auto& each : kCases)
         EXPECT_EQ(failureOf([&] { node.setValue(each.control, each.text); }), each.failure);
-    EXPECT_EQ(node.value("format_3dl_id"), "autodesk flame/smoke");
-    EXPECT_EQ(failureOf([&] { node.value("generate"); }),
-              "GenerateLUT1.generate: the control has no value");
 
     node.setValue("file_type", ".vf");
     for (const std::string text : {"abc", "1.5", "12 13", "", "99999999999", "+-1", "0x10"}) {
@@ -88,7 +83,6 @@ TEST_F(NodeTest, RefusesInputsThatCannotBe) {
     host::Node& first = host_.createNode("GenerateLUT");
     host::Node& second = host_.createNode("GenerateLUT");
     EXPECT_EQ(failureOf([&] { read.connect(0, first); }), "Read1: there is no input 0");
-    EXPECT_EQ(failureOf([&] { first.connect(1, read); }), "GenerateLUT1: there is no input 1");
     second.connect(0, first);
     EXPECT_EQ(failureOf([&] { first.connect(0, second); }),
               "GenerateLUT1: GenerateLUT2 depends on it already");

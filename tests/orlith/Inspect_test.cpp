@@ -23,7 +23,7 @@ TEST_F(InspectTest, InfoTellsAPersonWhatIsInAFile) {
               "range           0 0 0.25 to 1 1 0.5\n"
               "from identity   1 at most\n"
               "monotone        red yes, green yes, blue yes\n");
-    folder_.write("curve", "LUT_1D_SIZE 3\n0 1 nan\n0.1 0.25 nan\n1 0.5 nan\n");
+    folder_.write("curve", "LUT_1D_SIZE 3\n0 1 nan\n0 0.25 nan\n1 0.5 nan\n");
     EXPECT_EQ(output("info curve --from cube --values --strict"),
               "file            curve\n"
               "format          .cube\n"
@@ -34,7 +34,7 @@ TEST_F(InspectTest, InfoTellsAPersonWhatIsInAFile) {
               "from identity   inf at most\n"
               "monotone        red yes, green no, blue no\n"
               "0 1 nan\n"
-              "0.1 0.25 nan\n"
+              "0 0.25 nan\n"
               "1 0.5 nan\n");
 }
 

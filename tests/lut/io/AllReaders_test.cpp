@@ -1,7 +1,6 @@
 // What readers have in common. What they make of single lines is in ReaderRows_test.cpp.
 
 #include <gtest/gtest.h>
-#include <sys/resource.h>
 
 #include <cstdint>
 #include <filesystem>
@@ -72,47 +71,6 @@ TEST(EveryFormat, SurvivesEveryTruncationOfItsSamples) {
     }
     testing::internal::GetCapturedStderr();
     EXPECT_GE(fileCount, 20);
-}
-
-/// Most memory that this process has had resident so far.
-std::int64_t peakMebibytes() {
-    rusage usage{};
-    getrusage(RUSAGE_SELF, &usage);
-#ifdef __APPLE__
-    return usage.ru_maxrss >> 20;  // given in bytes
-#else
-    return usage.ru_maxrss >> 10;
-#endif
-}
-
-// Each table would be 1.4 GiB, if the samples that the file does not hold were touched.
-TEST(EveryFormat, CostsNoMemoryForWhatAFileOnlyClaims) {
-    std::string grid;
-    for (int i = 0; i < 500; ++i)
-        grid += std::to_string(i * 65535 / 499) + " ";
-    const std::string cub = "# width 500 500 500\n1 1 1\n# width 500 500 499\n1 1 1\n";
-    const std::string csp = "CSPLUTV100\n3D\n1\n0\n0\n1\n0\n0\n1\n0\n0\n";
-    const std::string vf = "#Inventor V2.1 ascii\n\nparameters\n";
-    const struct {
-        const char* extension;
-        std::string text;
-        bool isTable;
-    } kFiles[] = {
-        {".3dl", grid + "\n1 2 3\n", true},  // of 4 bits, which is known at the end
-        {".cms", "LUT_3D_SIZE 500\n", true},
-        {".csp", csp + "500 500 500\n0 0 0\n", false},
-        {".csp", csp + "2147483647 0 2147483647\n", true},
-        {".cub", cub + cub + cub + cub, true},
-        {".cube", "LUT_3D_SIZE 500\n1 1 1\n", true},
-        {".vf", vf + "grid_size 500 500 500\ngrid_size 500 500 499\ndata\n", false},
-        {".vf", vf + "grid_size 0 2147483647 2147483647\n", true},
-    };
-    const std::int64_t before = peakMebibytes();
-    for (const auto& each : kFiles) {
-        const std::string message = messageOf([&] { readBytes(each.extension, each.text); });
-        EXPECT_EQ(message == "(no exception)", each.isTable) << message;
-        EXPECT_LT(peakMebibytes() - before, 64) << each.extension;
-    }
 }
 
 }  // namespace

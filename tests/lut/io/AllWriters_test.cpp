@@ -4,6 +4,7 @@
 #include <gtest/gtest.h>
 
 #include <filesystem>
+#include <optional>
 
 #include "lut/io/Registry.h"
 #include "tests/support/Files.h"
@@ -72,16 +73,15 @@ TEST(TextWriter, WritesTheseBytes) {
         SCOPED_TRACE(name);
         const TempFolder folder;
         const std::string path = folder.write("old", std::string(100000, 'x'));
-        const auto expectWritten = [&, name = name, &lut = lut, &writing = writing](int flushes) {
+        for (const int flushes : {0, 1}) {
+            std::optional<GermanLocale> locale;
+            if (flushes == 0) locale.emplace();
             const auto writer = ol::createWriter(name, false, "");
             writing(*writer);
             setProperty<Orlith::Property::Int>(*writer, "flushLines", flushes);
             writer->write(path, lut);
             EXPECT_EQ(readFile(path), readFile(dataPath(name)));
-        };
-        expectWritten(1);
-        const GermanLocale locale;
-        expectWritten(0);
+        }
     }
     testing::internal::GetCapturedStderr();
 }

@@ -2,9 +2,6 @@
 
 #include <gtest/gtest.h>
 
-#include <cmath>
-#include <stdexcept>
-
 #include "tests/support/Files.h"
 #include "tests/support/Tables.h"
 #include "tests/support/ThreeDL.h"
@@ -34,13 +31,6 @@ TEST(ThreeDLReader, RefusesWithoutItsPropertiesInOrder) {
     Reading3DL()(wrongKind);
     EXPECT_EQ(messageOf([&] { wrongKind.read("/no/such.3dl"); }),
               "3DL file reader: unable to find output bitdepth to read");
-}
-
-TEST(ThreeDLReader, RefusesALatticeThatNoTableCanHold) {
-    std::string grid;
-    for (int i = 1; i < 100000; ++i)
-        grid += "0 ";
-    EXPECT_THROW(readBytes(".3dl", grid + "1\n"), std::length_error);
 }
 
 }  // namespace

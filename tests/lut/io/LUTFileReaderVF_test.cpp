@@ -13,12 +13,6 @@ using namespace test;
 constexpr char kHeaderError[] = "VF file reader: expecting #Inventor V2.1 ascii header line.";
 constexpr char kDataError[] = "VF file reader: syntax error while reading LUT data.";
 
-/// A file with this parameter line and one sample.
-std::string field(const std::string& parameter) {
-    return "#Inventor V2.1 ascii\nSoVectorField {\nparameters\ngrid_size 1 1 1\n" + parameter +
-           "data\n.5 .25 .125\n}\n";
-}
-
 TEST(VFReader, PutsBlueFastestWhetherCompressedOrNot) {
     const std::string plain = readFile(dataPath("vf/lattice.vf"));
     const std::string compressed = readFile(dataPath("vf/lattice.vfz"));
@@ -31,14 +25,6 @@ TEST(VFReader, PutsBlueFastestWhetherCompressedOrNot) {
             EXPECT_EQ(lut->transform, ol::Transform(kPlaced));
         }
     }
-}
-
-TEST(VFReader, CutsAnEnormousLineOfASmallFile) {
-    // Uncut, the line would be a parameter to skip and the sample behind it would be read.
-    const std::string line = "note " + std::string(std::size_t{64} << 20, ' ') + "\n";
-    const std::string bytes = gzip(field(line));
-    ASSERT_LT(bytes.size(), std::size_t{1} << 20);
-    EXPECT_EQ(messageOf([&] { readBytes(".vfz", bytes); }), kDataError);
 }
 
 TEST(VFReader, EndsCompressedDataAtAFault) {

@@ -14,27 +14,18 @@ namespace {
 using namespace test;
 namespace op = Orlith::Property;
 
-/// 2 x 2 x 2 points; the 12-bit code of channel c at (r, g, b) is r + 10 g + 100 b + 1000 c.
-boost::shared_ptr<ol::LUT3D> codeLattice() {
-    return markedLattice(2, 2, 2, 4095.0F);
-}
-
 /// The bytes of a file, and in warnings what the writer said meanwhile.
-std::string written(ol::LUTFileWriter3DL& writer, const boost::shared_ptr<ol::LUT>& lut,
+template <class Settings = Writing3DL>
+std::string written(const Settings& settings, const boost::shared_ptr<ol::LUT>& lut,
                     std::string* warnings = nullptr) {
+    ol::LUTFileWriter3DL writer;
     const TempFolder folder;
+    settings(writer);
     testing::internal::CaptureStderr();
     writer.write(folder.path("out.3dl"), lut);
     const std::string said = testing::internal::GetCapturedStderr();
     if (warnings != nullptr) *warnings = said;
     return readFile(folder.path("out.3dl"));
-}
-
-std::string written(const Writing3DL& settings, const boost::shared_ptr<ol::LUT>& lut,
-                    std::string* warnings = nullptr) {
-    ol::LUTFileWriter3DL writer;
-    settings(writer);
-    return written(writer, lut, warnings);
 }
 
 void expectHolds(const std::string& file, const std::string& text) {
@@ -43,27 +34,25 @@ void expectHolds(const std::string& file, const std::string& text) {
 
 TEST(ThreeDLWriter, WritesEveryDepthInEveryDialect) {
     const struct {
-        std::string bits;
-        const char* grid;  // three points; the middle is a tie and goes to the even code
-        const char* white;
-        const char* scratchWhite;  // 97/99 of the largest code, and 15
-    } kCodes[] = {{"4", "\n0 8 15 \n", "\n15 15 15\n", "\n15 15 15\n"},
-                  {"8", "\n0 128 255 \n", "\n255 255 255\n", "\n255 255 255\n"},
-                  {"10", "\n0 512 1023 \n", "\n1023 1023 1023\n", "\n1017 1017 1017\n"},
-                  {"12", "\n0 2048 4095 \n", "\n4095 4095 4095\n", "\n4027 4027 4027\n"},
-                  {"16", "\n0 32768 65535 \n", "\n65535 65535 65535\n", "\n64226 64226 64226\n"}};
+        int bits;
+        const char* grid;         // three points; the middle is a tie and goes to the even code
+        int white, scratchWhite;  // 97/99 of the largest code, and 15
+    } kCodes[] = {{4, "\n0 8 15 \n", 15, 15},
+                  {8, "\n0 128 255 \n", 255, 255},
+                  {10, "\n0 512 1023 \n", 1023, 1017},
+                  {12, "\n0 2048 4095 \n", 4095, 4027},
+                  {16, "\n0 32768 65535 \n", 65535, 64226}};
     const auto lut = markedLattice(3, 3, 3);
     lut->get(2, 2, 2) = ol::RGB(1.0F, 1.0F, 1.0F);
-    for (const std::string format : {"flame", "lustre", "scratch"}) {
+    for (const char* const format : {"flame", "lustre", "scratch"}) {
         for (const auto& input : kCodes) {
             for (const auto& output : kCodes) {
-                SCOPED_TRACE(format + " " + input.bits + " to " + output.bits);
-                const std::string file =
-                    written({format.c_str(), std::stoi(input.bits), std::stoi(output.bits)}, lut);
-                expectHolds(file, "\n# Input bit depth " + input.bits + "\n# Output bit depth " +
-                                      output.bits + "\n");
+                const std::string file = written({format, input.bits, output.bits}, lut);
+                expectHolds(file, "\n# Input bit depth " + std::to_string(input.bits) +
+                                      "\n# Output bit depth " + std::to_string(output.bits) + "\n");
                 expectHolds(file, input.grid);
-                expectHolds(file, format == "scratch" ? output.scratchWhite : output.white);
+                const int white = *format == 's' ? output.scratchWhite : output.white;
+                expectHolds(file, " " + std::to_string(white) + "\n");
             }
         }
     }
@@ -102,25 +91,23 @@ TEST(ThreeDLWriter, ClampsOnlyIfToldTo) {
 TEST(ThreeDLWriter, WarnsOfWhatTheProgramsDislike) {
     const std::string size =
         "Warning: Flame/Lustre prefers 3DL files of 17x17x17, 33x33x33, 65x65x65\n";
-    const std::string depth =
-        "Warning: Flame/Lustre prefers 3DL files with input bit depth of at least 10\n";
-    const std::string scratchSize = "Warning: SCRATCH prefers 3DL files of 32x32x32\n";
-    const std::string scratchDepth =
-        "Warning: SCRATCH prefers 3DL files with input bit depth of at least 10\n";
-    const std::string scratchMatch =
-        "Warning: SCRATCH expects 3DL files with matching input/output bit depth\n";
+    const std::string depth = " prefers 3DL files with input bit depth of at least 10\n";
+    const std::string flameDepth = "Warning: Flame/Lustre" + depth;
+    const std::string scratchDepth = "Warning: SCRATCH" + depth;
     const struct {
         Writing3DL settings;
         int pointsPerSide;
         std::string warnings;
-    } kCases[] = {{{"flame", 10, 8}, 17, ""},
-                  {{"lustre", 12, 8}, 33, ""},
-                  {{"flame", 10, 10}, 32, size},
-                  {{"lustre", 8, 10}, 65, depth},
-                  {{"lustre", 4, 10}, 9, size + depth},
-                  {{"scratch", 10, 10}, 32, ""},
-                  {{"scratch", 8, 8}, 32, scratchDepth},
-                  {{"scratch", 8, 10}, 33, scratchSize + scratchDepth + scratchMatch}};
+    } kCases[] = {
+        {{"flame", 10, 8}, 17, ""},
+        {{"lustre", 12, 8}, 33, ""},
+        {{"lustre", 8, 10}, 65, flameDepth},
+        {{"lustre", 4, 10}, 9, size + flameDepth},
+        {{"scratch", 10, 10}, 32, ""},
+        {{"scratch", 8, 10},
+         33,
+         "Warning: SCRATCH prefers 3DL files of 32x32x32\n" + scratchDepth +
+             "Warning: SCRATCH expects 3DL files with matching input/output bit depth\n"}};
     for (const auto& [settings, n, expected] : kCases) {
         SCOPED_TRACE(std::string(settings.format) + " of " + std::to_string(n));
         std::string warnings;
@@ -131,49 +118,40 @@ TEST(ThreeDLWriter, WarnsOfWhatTheProgramsDislike) {
 
 TEST(ThreeDLWriter, RefusesInOrderBeforeAFileIsMade) {
     const TempFolder folder;
-    ol::LUTFileWriter3DL writer;
-    const auto refusal = [&](const boost::shared_ptr<ol::LUT>& lut) {
-        return messageOf([&] { writer.write(folder.path("no.3dl"), lut); });
+    const auto refusal = [&](ol::LUTFileWriter3DL& writer) {
+        return messageOf([&] { writer.write(folder.path("no.3dl"), markedLattice(4, 4, 4)); });
     };
-    const auto lattice = markedLattice(4, 4, 4);
-    EXPECT_EQ(refusal(lattice), "unable to find 3DL format to write");
     for (const char* const format : {"auto", "Flame", ""}) {
         ol::LUTFileWriter3DL other;
         setProperty<op::String>(other, "format3DL", format);
-        EXPECT_EQ(messageOf([&] { other.write(folder.path("no.3dl"), lattice); }),
-                  "3DL file reader: invalid 3DL format specified for writing");
+        EXPECT_EQ(refusal(other), "3DL file reader: invalid 3DL format specified for writing");
     }
+    ol::LUTFileWriter3DL writer;
+    EXPECT_EQ(refusal(writer), "unable to find 3DL format to write");
     setProperty<op::String>(writer, "format3DL", "lustre");
     const char* const steps[][2] = {{"inputBitDepth", "unable to find input bitdepth to write"},
                                     {"outputBitDepth", "unable to find output bitdepth to write"},
                                     {"clampOutput", "unable to find clamp property"}};
     for (const auto& [name, message] : steps) {
-        EXPECT_EQ(refusal(lattice), message);
+        EXPECT_EQ(refusal(writer), message);
         setProperty<op::Int>(writer, name, 10);
     }
     testing::internal::CaptureStderr();
-    EXPECT_EQ(refusal(lattice), "Lustre 3DL cube resolution must be a power of two (plus one)");
+    EXPECT_EQ(refusal(writer), "Lustre 3DL cube resolution must be a power of two (plus one)");
     EXPECT_EQ(testing::internal::GetCapturedStderr(),
               "Warning: Flame/Lustre prefers 3DL files of 17x17x17, 33x33x33, 65x65x65\n");
     EXPECT_FALSE(std::filesystem::exists(folder.path("no.3dl")));
 }
 
-TEST(ThreeDLWriter, TakesAPropertyOfTheWrongKindForMissing) {
-    ol::LUTFileWriter3DL wrongFormat;
-    setProperty<op::Int>(wrongFormat, "format3DL", 1);
-    EXPECT_EQ(messageOf([&] { wrongFormat.write("/no/out.3dl", codeLattice()); }),
-              "unable to find 3DL format to write");
-    ol::LUTFileWriter3DL wrongDepth;
-    setProperty<op::Double>(wrongDepth, "inputBitDepth", 10.0);
-    Writing3DL{"flame"}(wrongDepth);
-    EXPECT_EQ(messageOf([&] { wrongDepth.write("/no/out.3dl", codeLattice()); }),
-              "unable to find input bitdepth to write");
-    ol::LUTFileWriter3DL wrongScale;
-    setProperty<op::Int>(wrongScale, "scale", 0);
-    wrongScale.setProperty("offset", boost::make_shared<op::Double>("offset", 2U));
-    Writing3DL{"flame"}(wrongScale);
+TEST(ThreeDLWriter, WarnsOfAScaleAndOffsetThatItCannotTake) {
+    const auto settings = [](ol::LUTFileWriter3DL& writer) {
+        setProperty<op::Int>(writer, "scale", 0);
+        writer.setProperty("offset", boost::make_shared<op::Double>("offset", 2U));
+        Writing3DL{"flame"}(writer);
+    };
     std::string warnings;
-    EXPECT_EQ(written(wrongScale, codeLattice(), &warnings), readFile(dataPath("3dl/flame.3dl")));
+    EXPECT_EQ(written(settings, markedLattice(2, 2, 2, 4095.0F), &warnings),
+              readFile(dataPath("3dl/flame.3dl")));
     EXPECT_EQ(warnings.substr(0, warnings.find("Warning: Flame")),
               "Warning: 3DL scale is not a Double of one value, writing unscaled\n"
               "Warning: 3DL offset is not a Double of one value, writing without\n");

