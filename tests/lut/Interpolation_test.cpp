@@ -287,6 +287,8 @@ TEST(Interpolation, RefusesCurves) {
               "CubicInterpolate: expecting a 3D lut");
     EXPECT_EQ(messageOf([&] { ol::LinearStaggeredInterpolate(*curve, point); }),
               "LinearStaggeredInterpolate: expecting a 3D lut");
+    EXPECT_EQ(messageOf([&] { ol::TetrahedralInterpolate(*curve, point); }),
+              "TetrahedralInterpolate: expecting a 3D lut");
     EXPECT_EQ(messageOf([&] { ol::Extrapolate(*curve, 0, 0, 0); }),
               "Extrapolate: expecting a 3D lut");
 }
