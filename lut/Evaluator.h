@@ -20,13 +20,15 @@ namespace Orlith::LUT {
 /// - A table without samples gives zeros.
 ///
 /// Threads  apply may run any number of times at once.
+/// Memory   with the first many colours a copy of the table is made, a third larger than itself and
+///          shared by the Evaluator's copies; not of lattices of more than 158 points a side.
 class Evaluator {
 public:
     enum class Method {
         Step,
         Staggered,
         Trilinear,
-        Tetrahedral,  ///< the four corners of the cell's tetrahedron: see tetrahedralAt
+        Tetrahedral,  ///< the four corners of the cell's tetrahedron: see TetrahedralInterpolate
         Cubic
     };
 
@@ -45,9 +47,12 @@ public:
     void apply(const float* rgbIn, float* rgbOut, std::size_t colourCount) const;
 
 private:
+    struct Preparation;
+
     boost::shared_ptr<const LUT> table_;
     Method method_;
     Outside outside_;
+    boost::shared_ptr<Preparation> preparation_;
 };
 
 }  // namespace Orlith::LUT

@@ -3,7 +3,7 @@
 #include <algorithm>
 
 #include "lut/Exception.h"
-#include "lut/LatticeMethods.h"
+#include "lut/evaluation/LatticeMethods.h"
 
 namespace Orlith::LUT {
 namespace {
@@ -33,6 +33,10 @@ RGB LinearStaggeredInterpolate(const LUT& lut, const RGB& point) {
 
 RGB TrilinearInterpolate(const LUT& lut, const RGB& point) {
     return interpolate<trilinearAt>(lut, point, "TrilinearInterpolate: expecting a 3D lut");
+}
+
+RGB TetrahedralInterpolate(const LUT& lut, const RGB& point) {
+    return interpolate<tetrahedralAt>(lut, point, "TetrahedralInterpolate: expecting a 3D lut");
 }
 
 RGB CubicInterpolate(const LUT& lut, const RGB& point) {

@@ -22,6 +22,16 @@ RGB LinearStaggeredInterpolate(const LUT& lut, const RGB& point);
 /// @throws Exception "TrilinearInterpolate: expecting a 3D lut"
 RGB TrilinearInterpolate(const LUT& lut, const RGB& point);
 
+/// Four corners of the cell, which falls into six tetrahedra around the diagonal from its lowest to
+/// its highest corner. Along the axes in the order of the position's fractions, the largest first
+/// (of equal ones red, then green), lead the four corners p0 to p3 of the point's own tetrahedron.
+/// With these fractions f0 >= f1 >= f2 the result is, in this order of operations,
+/// (((1 - f0) p0 + (f0 - f1) p1) + (f1 - f2) p2) + f2 p3. On the face between two tetrahedra the
+/// corner in which they differ weighs 0: the pieces meet. Beyond the lattice its edge goes on.
+/// Not one of the modes of LUT::interpolate.
+/// @throws Exception "TetrahedralInterpolate: expecting a 3D lut"
+RGB TetrahedralInterpolate(const LUT& lut, const RGB& point);
+
 /// Catmull-Rom over the 4 x 4 x 4 neighbourhood, continued linearly beyond the lattice.
 /// @throws Exception "CubicInterpolate: expecting a 3D lut"
 RGB CubicInterpolate(const LUT& lut, const RGB& point);

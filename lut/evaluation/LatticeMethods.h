@@ -63,11 +63,7 @@ RGB staggeredAt(const Lattice& lattice, const LatticePosition& x);
 /// See TrilinearInterpolate.
 RGB trilinearAt(const Lattice& lattice, const LatticePosition& x);
 
-/// The cell's six tetrahedra around the diagonal from its lowest to its highest corner. Along the
-/// axes in the order of their fractions, the largest first (of equal ones red, then green), lead
-/// the four corners p0 to p3 of the colour's own tetrahedron. With these fractions f0 >= f1 >= f2:
-/// (((1 - f0) p0 + (f0 - f1) p1) + (f1 - f2) p2) + f2 p3. On the face between two tetrahedra the
-/// corner in which they differ weighs 0: the pieces meet. Beyond the lattice its edge goes on.
+/// See TetrahedralInterpolate.
 RGB tetrahedralAt(const Lattice& lattice, const LatticePosition& x);
 
 /// See CubicInterpolate.

@@ -1,4 +1,4 @@
-#include "lut/LatticeMethods.h"
+#include "lut/evaluation/LatticeMethods.h"
 
 #include <algorithm>
 #include <cmath>
