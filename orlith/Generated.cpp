@@ -7,11 +7,11 @@
 
 #include "lut/LUT3D.h"
 #include "lut/io/Registry.h"
-#include "orlith/Look.h"
 #include "orlith/Messages.h"
-#include "orlith/TableFile.h"
-#include "orlith/Verification.h"
-#include "orlith/WriteOptions.h"
+#include "orlith/table/Look.h"
+#include "orlith/table/TableFile.h"
+#include "orlith/table/Verification.h"
+#include "orlith/table/WriteOptions.h"
 
 namespace orlith {
 namespace {
@@ -64,11 +64,15 @@ void warnOfOtherLook(const Generated& file, const std::string& extension,
     if (!(deviation > kFormatPrecision)) return;
     std::string base;
     Orlith::LUT::splitExtension(file.name, &base, nullptr);
+    const std::string cure =
+        extension == ".cub"
+            ? "--lut1d 0 leaves it away"
+            : fmt::format("generate {0}.cube and make it by \"orlith convert {0}.cube {1}\"", base,
+                          file.name);
     warn(fmt::format(
-        "{0}: programs that read {1} files see a look that is off by {2:.2g}: the operator's"
-        " pre-LUT from 0 to 1 reaches the first cell of the lattice only; generate {3}.cube and"
-        " make it by \"orlith convert {3}.cube {0}\"",
-        file.name, extension, deviation, base));
+        "{}: programs that read {} files see a look that is off by {:.2g}: the operator's pre-LUT"
+        " from 0 to 1 reaches the first cell of the lattice only; {}",
+        file.name, extension, deviation, cure));
 }
 
 }  // namespace

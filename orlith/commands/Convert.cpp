@@ -6,14 +6,14 @@
 #include "lut/Exception.h"
 #include "lut/io/Registry.h"
 #include "orlith/Command.h"
-#include "orlith/Fitting.h"
-#include "orlith/Look.h"
 #include "orlith/Messages.h"
 #include "orlith/Options.h"
 #include "orlith/OutputFile.h"
-#include "orlith/TableFile.h"
-#include "orlith/Verification.h"
-#include "orlith/WriteOptions.h"
+#include "orlith/table/Fitting.h"
+#include "orlith/table/Look.h"
+#include "orlith/table/TableFile.h"
+#include "orlith/table/Verification.h"
+#include "orlith/table/WriteOptions.h"
 
 namespace orlith {
 namespace {
@@ -61,7 +61,7 @@ std::string refusal(const ol::Exception& exception, const std::string& extension
     if (extension == ".blut" && lut.is1D()) return "a .blut file is written of lattices only";
     std::string text = exception.message();
     if (extension == ".cms" && !lut.is1D() && lut.outputShaper.empty()) {
-        text += " (--lut1d 1024 --style1d linear gives it some)";
+        text += " (without --strict and --lut1d it gets some that change nothing)";
     }
     return text;
 }
@@ -78,26 +78,6 @@ void writeTable(ol::LUTFileWriter& writer, const OutputFile& output, const std::
         throw Failure(fmt::format("{}: not all of the file could be written{}", output.name(),
                                   writeFailureReason(errno)));
     }
-}
-
-/// Samples beyond what the codes of a .3dl file reach.
-struct Clipping {
-    std::uint64_t count = 0;
-    float farthest = 0.0F;  // of them, from the middle
-};
-
-Clipping clippingOf(const ol::LUT& lut, const std::string& extension, const Options3DL& options) {
-    Clipping clipping;
-    if (extension != ".3dl" || !options.clampOutput) return clipping;
-    const float* const samples = lut.data();
-    for (std::uint64_t i = 0; i < 3 * pointCount(lut); ++i) {
-        if (samples[i] >= 0.0F && samples[i] <= 1.0F) continue;
-        ++clipping.count;
-        if (std::fabs(samples[i] - 0.5F) > std::fabs(clipping.farthest - 0.5F)) {
-            clipping.farthest = samples[i];
-        }
-    }
-    return clipping;
 }
 
 /// How far the file's look is from that of the table that it was made of: at the file's points,
@@ -144,17 +124,15 @@ double precisionOf(const std::string& extension, const Options3DL& options, cons
 std::string compareLooks(const OutputFile& output, const std::string& extension,
                          const ConvertOptions& options, const Options3DL& options3DL,
                          const boost::shared_ptr<ol::LUT>& source, const Fitted& fitted,
-                         const Clipping& clipping) {
+                         const std::string& clipping) {
     const Table back =
         readTable(output.stagedPath(), readingOf(extension, options3DL), output.name());
     const double deviation = lookDeviation(source, back.lut);
     std::string words = fmt::format("largest deviation {:.2g}", deviation);
     std::vector<std::string> causes;
     if (!fitted.whyResampled.empty()) causes.push_back("resampled for " + fitted.whyResampled);
-    if (clipping.count > 0) {
-        causes.push_back(
-            fmt::format("clipped: {} numbers, the farthest {}", clipping.count, clipping.farthest));
-    }
+    if (fitted.whyResampled == "a shaper") causes.emplace_back("a .csp file keeps it");
+    if (!clipping.empty()) causes.push_back(clipping);
     if (options.writing.hasPreLUT()) causes.emplace_back("the pre-LUT as asked for");
     if (options.writing.scale || options.writing.offset) causes.emplace_back("scale and offset");
     if (!causes.empty()) return fmt::format("{} ({})", words, fmt::join(causes, "; "));
@@ -174,6 +152,14 @@ Fitted fitTo(const ConvertOptions& options, const boost::shared_ptr<ol::LUT>& lu
     }
 }
 
+/// By the book only samples are sure to be written.
+void warnOfLosses(const std::string& name, const std::string& extension, const ol::LUT& lut) {
+    const std::string lost = whyNotHeld(lut, extension);
+    if (lost != "a shaper" && lost != "its domain") return;
+    warn(fmt::format("{}: a {} file does not hold the table's {}", name, extension,
+                     lost == "a shaper" ? "pre-LUT" : "domain"));
+}
+
 void setFlag(ol::LUTFileWriter& writer, const char* name, int value) {
     writer.setProperty(name, Orlith::Property::makeProperty<Orlith::Property::Int>(name, value));
 }
@@ -188,18 +174,25 @@ int runConvert(const ConvertOptions& options) {
     const bool isByBook = options.reading.isStrict || options.writing.hasPreLUT();
     setFlag(*writer, "interchange", isByBook ? 0 : 1);
 
+    if (options.writing.hasPreLUT() && !takesRamp(extension)) {
+        throw UsageError("--lut1d and --style1d are for .cms and .cub files");
+    }
     const Table table = readWholeTable(options.input, options.reading);
     dropIdentityPreLUT(*table.lut);
     Fitted fitted{table.lut, "", ""};
-    if (!options.reading.isStrict) fitted = fitTo(options, table.lut, extension);
+    if (options.reading.isStrict) {
+        warnOfLosses(options.output, extension, *table.lut);
+    } else {
+        fitted = fitTo(options, table.lut, extension);
+    }
     addPreLUT(*fitted.lut, options.writing);
     const std::string unreadable = whyUnreadable(extension, *fitted.lut);
-    const Clipping clipping = clippingOf(*fitted.lut, extension, options3DL);
+    const std::string clipping = clippingText(*fitted.lut, extension, options3DL);
 
     OutputFile output(options.output);
     writeTable(*writer, output, extension, fitted.lut);
     if (!fitted.domainChange.empty()) {
-        warn(fmt::format("{}: its domain shrinks {}", output.name(), fitted.domainChange));
+        warn(fmt::format("{}: its domain changes {}", output.name(), fitted.domainChange));
     }
     std::string words = output.whyNotReadBack(options.skipsVerification);
     if (words.empty()) words = unreadable;

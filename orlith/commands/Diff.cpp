@@ -5,13 +5,13 @@
 #include <cstdint>
 
 #include "lut/io/Lattice.h"
-#include "orlith/ColourOptions.h"
 #include "orlith/Command.h"
-#include "orlith/Facts.h"
 #include "orlith/Json.h"
-#include "orlith/Look.h"
 #include "orlith/Options.h"
-#include "orlith/TableFile.h"
+#include "orlith/table/ColourOptions.h"
+#include "orlith/table/Facts.h"
+#include "orlith/table/Look.h"
+#include "orlith/table/TableFile.h"
 
 namespace orlith {
 namespace {

@@ -7,10 +7,10 @@
 
 #include "lut/io/text/Numbers.h"
 #include "lut/io/text/Tokens.h"
-#include "orlith/ColourOptions.h"
 #include "orlith/Command.h"
 #include "orlith/Options.h"
-#include "orlith/TableFile.h"
+#include "orlith/table/ColourOptions.h"
+#include "orlith/table/TableFile.h"
 
 namespace orlith {
 namespace {

@@ -12,10 +12,10 @@
 #include "orlith/Messages.h"
 #include "orlith/Options.h"
 #include "orlith/OutputFile.h"
-#include "orlith/PatternReading.h"
-#include "orlith/TableFile.h"
-#include "orlith/Verification.h"
-#include "orlith/WriteOptions.h"
+#include "orlith/pattern/PatternReading.h"
+#include "orlith/table/TableFile.h"
+#include "orlith/table/Verification.h"
+#include "orlith/table/WriteOptions.h"
 
 namespace orlith {
 namespace {
@@ -41,7 +41,7 @@ struct ControlOption {
 
 constexpr ControlOption kControlOptions[] = {
     {"--file-type", "file_type", "EXT", "Format, such as .3dl; an empty text: by the file's name"},
-    {"--lut1d", "lut1d", "N", "Entries of the pre-LUT (1024), 0: none; not for .3dl"},
+    {"--lut1d", "lut1d", "N", "Entries of the pre-LUT of .cms and .cub files (1024), 0: none"},
     {"--style1d", "style1d", "STYLE",
      "Ramp of the pre-LUT: linear, or logarithmic, which is a smooth step (default)"},
     {"--bitdepth", "bitdepth_id", "BITS", "Bits of a .3dl file's input grid: 4 8 10 12 16 (10)"},
@@ -130,6 +130,9 @@ int runGenerate(const GenerateOptions& options) {
         warn(text);
 
     const std::string path = generate.value("file");
+    if (path == "-" && formatWritten(generate, path).empty()) {
+        throw UsageError("standard output has no extension: name the format by --file-type");
+    }
     const std::string unreadable = whyUnreadable(formatWritten(generate, path), *pattern.table);
     if (!unreadable.empty()) throw Failure(fmt::format("{}: {}", path, unreadable));
     OutputFile output(path);

@@ -6,10 +6,11 @@
 #include <string>
 
 #include "orlith/Command.h"
-#include "orlith/Facts.h"
 #include "orlith/Json.h"
 #include "orlith/Messages.h"
-#include "orlith/TableFile.h"
+#include "orlith/table/Facts.h"
+#include "orlith/table/Look.h"
+#include "orlith/table/TableFile.h"
 
 namespace orlith {
 namespace {
@@ -112,9 +113,7 @@ void printShaper(const char* name, const ol::Shaper& shaper) {
 
 void printText(const Table& table, const InfoOptions& options) {
     const ol::LUT& lut = *table.lut;
-    ol::RGB min;
-    ol::RGB max;
-    lut.minmax(min, max);
+    const Domain domain = domainOf(lut);
     const auto line = [](const char* name, const std::string& value) {
         fmt::print("{:<16}{}\n", name, value);
     };
@@ -122,13 +121,13 @@ void printText(const Table& table, const InfoOptions& options) {
     line("format", table.extension);
     line("table", fmt::format("{}, {}", lut.is1D() ? "1D" : "3D", sizeText(lut)));
     line("samples read", fmt::format("{}", table.samplesRead));
-    line("domain", fmt::format("{} to {}", triple(min), triple(max)));
+    line("domain", fmt::format("{} to {}", triple(domain.min), triple(domain.max)));
     printShaper("input shaper", lut.inputShaper);
     printShaper("output shaper", lut.outputShaper);
     if (const auto found = facts(table)) {
         const auto yesNo = [](bool yes) { return yes ? "yes" : "no"; };
         line("range", fmt::format("{} to {}", triple(found->min), triple(found->max)));
-        line("from identity", fmt::format("{:.6g} at most", found->identityDeviation));
+        line("from identity", fmt::format("{:.6g} at most", identityDeviation(table.lut)));
         line("monotone", fmt::format("red {}, green {}, blue {}", yesNo(found->isMonotone[0]),
                                      yesNo(found->isMonotone[1]), yesNo(found->isMonotone[2])));
     } else {

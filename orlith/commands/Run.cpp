@@ -11,7 +11,7 @@
 #include "orlith/Generated.h"
 #include "orlith/Messages.h"
 #include "orlith/OutputFile.h"
-#include "orlith/PatternReading.h"
+#include "orlith/pattern/PatternReading.h"
 
 namespace orlith {
 namespace {

@@ -1,4 +1,4 @@
-#include "orlith/PatternReading.h"
+#include "orlith/pattern/PatternReading.h"
 
 #include <cmath>
 #include <functional>

@@ -1,4 +1,4 @@
-#include "orlith/Fitting.h"
+#include "orlith/table/Fitting.h"
 
 #include <fmt/format.h>
 
@@ -10,8 +10,8 @@
 #include "lut/LUT1D.h"
 #include "lut/LUT3D.h"
 #include "orlith/Command.h"
-#include "orlith/Look.h"
-#include "orlith/TableFile.h"
+#include "orlith/table/Look.h"
+#include "orlith/table/TableFile.h"
 
 namespace orlith {
 namespace {
@@ -129,6 +129,15 @@ boost::shared_ptr<ol::LUT> resample(const boost::shared_ptr<ol::LUT>& lut, const
 }
 
 }  // namespace
+
+std::string whyNotHeld(const ol::LUT& lut, const std::string& extension) {
+    return whyNot(lut, capacityOf(extension));
+}
+
+bool takesRamp(const std::string& extension) {
+    const Capacity& capacity = capacityOf(extension);
+    return capacity.holdsOutputShaper && !capacity.holdsInputShaper;
+}
 
 Fitted fit(const boost::shared_ptr<ol::LUT>& lut, const std::string& extension, int size) {
     const Capacity& capacity = capacityOf(extension);

@@ -1,4 +1,4 @@
-#include "orlith/Look.h"
+#include "orlith/table/Look.h"
 
 #include <algorithm>
 #include <cmath>

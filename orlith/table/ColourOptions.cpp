@@ -1,4 +1,4 @@
-#include "orlith/ColourOptions.h"
+#include "orlith/table/ColourOptions.h"
 
 #include <map>
 #include <string>
@@ -42,7 +42,7 @@ void addColourOptions(CLI::App& command, ColourOptions& options) {
                                                    {"tetrahedral", Method::Tetrahedral},
                                                    {"cubic", Method::Cubic}};
     command.add_option("--mode", options.method, "Interpolation of a lattice (trilinear)")
-        ->transform(CLI::Transformer(methods, CLI::ignore_case)
+        ->transform(CLI::CheckedTransformer(methods, CLI::ignore_case)
                         .description("step|staggered|trilinear|tetrahedral|cubic"))
         ->type_name("");
     command.add_flag("--extrapolate", options.extrapolates,

@@ -1,4 +1,4 @@
-#include "orlith/WriteOptions.h"
+#include "orlith/table/WriteOptions.h"
 
 #include "lut/RampFill.h"
 #include "orlith/Options.h"
@@ -64,7 +64,7 @@ void addWriteOptions(CLI::App& command, WriteOptions& options) {
     command
         .add_option_function<std::string>(
             "--lut1d", [&](const std::string& text) { options.lut1d = std::stoi(text); },
-            "Entries of a pre-LUT for a table that has none (1024); 0: none")
+            "Entries of a pre-LUT by the book, of .cms and .cub files; 0: none")
         ->check(wrongPreLUTSize)
         ->type_name("N");
     command

@@ -1,4 +1,4 @@
-#include "orlith/TableFile.h"
+#include "orlith/table/TableFile.h"
 
 #include <fmt/format.h>
 
@@ -185,6 +185,10 @@ Table readTable(const std::string& path, const ReadOptions& options, const std::
     try {
         table.lut = reader->read(file);
     } catch (const ol::Exception& exception) {
+        // The last remark is the failure's reason; those before may have led to it.
+        table.remarks = reader->remarks();
+        if (!table.remarks.empty()) table.remarks.pop_back();
+        warnOfRemarks(table);
         throw Failure(fmt::format("{}: {}{}{}", place(table.name, *reader), exception.message(),
                                   reasonOf(*reader), adviceOn(file, options)));
     } catch (const std::length_error&) {

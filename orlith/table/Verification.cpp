@@ -1,4 +1,4 @@
-#include "orlith/Verification.h"
+#include "orlith/table/Verification.h"
 
 #include <fmt/format.h>
 
@@ -8,7 +8,7 @@
 
 #include "orlith/Command.h"
 #include "orlith/Messages.h"
-#include "orlith/TableFile.h"
+#include "orlith/table/TableFile.h"
 
 namespace orlith {
 namespace {
@@ -98,6 +98,22 @@ Table readBack(const std::string& path, const ReadOptions& options, const std::s
 std::string whyUnreadable(const std::string& extension, const ol::LUT& table) {
     if (extension != ".blut" || table.width() <= kWidestBLUT) return "";
     return fmt::format("a .blut file of more than {} points a side cannot be read", kWidestBLUT);
+}
+
+std::string clippingText(const ol::LUT& lut, const std::string& extension,
+                         const Options3DL& options) {
+    if (extension != ".3dl" || !options.clampOutput) return "";
+    // What is nearer than half a code is no loss.
+    const float halfCode = 0.5F / static_cast<float>(std::ldexp(1.0, options.outputBits) - 1.0);
+    std::uint64_t count = 0;
+    float farthest = 0.5F;
+    const float* const samples = lut.data();
+    for (std::uint64_t i = 0; i < 3 * pointCount(lut); ++i) {
+        if (samples[i] >= -halfCode && samples[i] <= 1.0F + halfCode) continue;
+        ++count;
+        if (!(std::fabs(samples[i] - 0.5F) <= std::fabs(farthest - 0.5F))) farthest = samples[i];
+    }
+    return count == 0 ? "" : fmt::format("clipped: {} numbers, the farthest {}", count, farthest);
 }
 
 ReadOptions readingOf(const std::string& extension, const Options3DL& options) {

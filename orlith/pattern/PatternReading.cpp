@@ -1,4 +1,4 @@
-#include "orlith/PatternReading.h"
+#include "orlith/pattern/PatternReading.h"
 
 #include <fmt/format.h>
 
@@ -9,8 +9,8 @@
 
 #include "host/Host.h"
 #include "orlith/Command.h"
-#include "orlith/PatchExtent.h"
-#include "orlith/PatternOrientation.h"
+#include "orlith/pattern/PatchExtent.h"
+#include "orlith/pattern/PatternOrientation.h"
 #include "zefra/PatternLayout.h"
 #include "zefra/Row.h"
 

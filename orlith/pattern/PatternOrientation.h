@@ -3,7 +3,7 @@
 #include <string>
 #include <vector>
 
-#include "orlith/PatchExtent.h"
+#include "orlith/pattern/PatchExtent.h"
 
 namespace orlith {
 

@@ -1,4 +1,4 @@
-#include "orlith/PatchExtent.h"
+#include "orlith/pattern/PatchExtent.h"
 
 #include <algorithm>
 #include <cmath>

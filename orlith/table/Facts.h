@@ -1,6 +1,7 @@
 #pragma once
 
 #include <array>
+#include <boost/smart_ptr/shared_ptr.hpp>
 #include <string>
 
 #include "lut/LUT.h"
@@ -15,10 +16,12 @@ Orlith::LUT::RGB inputColour(const Orlith::LUT::LUT& lut, int r, int g, int b);
 struct Facts {
     Orlith::LUT::RGB min;  ///< smallest and largest sample of each channel; NaN is passed over,
     Orlith::LUT::RGB max;  ///< and is the result where there is nothing else
-    double identityDeviation = 0.0;  ///< largest distance of a sample from its
-                                     ///< input colour; infinite where there is a NaN
     std::array<bool, 3> isMonotone = {true, true, true};  ///< each channel along its own axis
 };
+
+/// The largest distance of a table's look from its input, at the inputs of its points; infinite
+/// where the look is not a number.
+double identityDeviation(const boost::shared_ptr<const Orlith::LUT::LUT>& lut);
 
 Facts factsOf(const Orlith::LUT::LUT& lut);
 

@@ -1,4 +1,4 @@
-#include "orlith/PatternOrientation.h"
+#include "orlith/pattern/PatternOrientation.h"
 
 #include <algorithm>
 #include <cstdint>

@@ -7,6 +7,14 @@
 
 namespace orlith {
 
+/// Why the files of a format cannot hold a table with its look as it is, such as "a shaper"; empty
+/// if they can.
+std::string whyNotHeld(const Orlith::LUT::LUT& lut, const std::string& extension);
+
+/// Whether the files of a format have a place for a pre-LUT that is the operator's: a ramp in front
+/// of the lattice.
+bool takesRamp(const std::string& extension);
+
 /// A table as a format holds it.
 struct Fitted {
     boost::shared_ptr<Orlith::LUT::LUT> lut;

@@ -3,14 +3,19 @@
 #include <string>
 
 #include "lut/LUT.h"
-#include "orlith/TableFile.h"
-#include "orlith/WriteOptions.h"
+#include "orlith/table/TableFile.h"
+#include "orlith/table/WriteOptions.h"
 
 namespace orlith {
 
 /// Why a file of a table, which the format's writer takes, could not be read again; empty if it
 /// can.
 std::string whyUnreadable(const std::string& extension, const Orlith::LUT::LUT& table);
+
+/// What the codes of a .3dl file do not reach: "clipped: 12 numbers, the farthest 1.5"; empty where
+/// all samples fit, and for other formats.
+std::string clippingText(const Orlith::LUT::LUT& lut, const std::string& extension,
+                         const Options3DL& options);
 
 /// How to read a file that was written with these options.
 ReadOptions readingOf(const std::string& extension, const Options3DL& options);

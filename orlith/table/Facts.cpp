@@ -1,9 +1,10 @@
-#include "orlith/Facts.h"
+#include "orlith/table/Facts.h"
 
 #include <cmath>
 #include <limits>
 
 #include "lut/io/Lattice.h"
+#include "orlith/table/Look.h"
 
 namespace orlith {
 namespace {
@@ -57,6 +58,25 @@ ol::RGB inputColour(const ol::LUT& lut, int r, int g, int b) {
     return colour;
 }
 
+double identityDeviation(const boost::shared_ptr<const ol::LUT>& lut) {
+    const ol::Evaluator evaluator(lut);
+    double largest = 0.0;
+    forEachInput(*lut, false, [&](const ol::RGB& colour) {
+        ol::RGB result;
+        evaluator.apply(colour.data_block(), result.data_block(), 1);
+        for (unsigned c = 0; c < 3; ++c) {
+            const double deviation =
+                std::fabs(static_cast<double>(result[c]) - static_cast<double>(colour[c]));
+            if (std::isnan(deviation)) {
+                largest = std::numeric_limits<double>::infinity();
+            } else if (deviation > largest) {
+                largest = deviation;
+            }
+        }
+    });
+    return largest;
+}
+
 Facts factsOf(const ol::LUT& lut) {
     Facts facts;
     facts.min.fill(std::numeric_limits<float>::infinity());
@@ -65,22 +85,11 @@ Facts factsOf(const ol::LUT& lut) {
     const ol::LatticeSize size =
         lut.is1D() ? ol::LatticeSize{lut.width(), 1, 1} : ol::LatticeSize::of(lut);
     const float* sample = lut.data();
-    ol::LatticePosition point;
     ol::forEachRedFastest(size, [&](std::size_t) {
-        const ol::RGB input = lut.is1D() ? inputColour(lut, point.r, point.r, point.r)
-                                         : inputColour(lut, point.r, point.g, point.b);
         for (unsigned c = 0; c < 3; ++c, ++sample) {
             if (*sample < facts.min[c]) facts.min[c] = *sample;
             if (*sample > facts.max[c]) facts.max[c] = *sample;
-            const double deviation =
-                std::fabs(static_cast<double>(*sample) - static_cast<double>(input[c]));
-            if (std::isnan(deviation)) {
-                facts.identityDeviation = std::numeric_limits<double>::infinity();
-            } else if (deviation > facts.identityDeviation) {
-                facts.identityDeviation = deviation;
-            }
         }
-        point.advanceRedFastest(size);
     });
     for (unsigned c = 0; c < 3; ++c) {
         if (facts.min[c] > facts.max[c]) {
