@@ -55,8 +55,7 @@ TEST(ThreeDLInterchange, ReadsFilesAsMeant) {
     const std::string cut = replaced(samples(5), "\n0 0 255\n", "\n");
     expectOutcomes(
         ".3dl",
-        {{"with a grid", header + grid + samples(5), kMeant, identity},
-         {"words behind", lustre + grid + samples(5) + "LUT8\ngamma 1.0\nEND 3DL\n", kMeant,
+        {{"words behind", lustre + grid + samples(5) + "LUT8\ngamma 1.0\nEND 3DL\n", kMeant,
           identity},
          {"depth guessed", grid + samples(5), kMeant, identity, guess},
          {"largest code of its bits", "0 341 682 1023\n" + samples(4, 15), kMeant,
@@ -94,6 +93,7 @@ TEST(ThreeDLInterchange, ReadsFilesAsMeant) {
           "1: an input grid needs at least 2 points"},
          {"another mesh", lustre3 + grid + samples(5), kMeant, kWrongSize,
           "3: the file states 3 points a side and has 5"},
+         {"nothing", "# x\n", kMeant, kNoSize, "1: there is no input grid"},
          {"no grid by the book", lustre + samples(5), kBook, kNegative,
           "3: what is missing should come before this line of three numbers"},
          {"own last code by the book", "0 255 510 765 1020\n" + samples(5), kBook, kNotFull,

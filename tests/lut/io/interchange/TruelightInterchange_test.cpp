@@ -35,6 +35,8 @@ TEST(TruelightInterchange, ReadsFilesAsMeant) {
                   "1: the line \"# width\" has to come before the data"},
                  {"two numbers", "# width 2 2\n" + kSamples, kMeant, kWidthError,
                   "1: a width needs 3 numbers, has 2"},
+                 {"one point", "# width 2 1 2\n0 0 0\n", kMeant, kWidthError,
+                  "1: a table needs at least 2 points a side"},
                  {"two widths", kWidth + kWidth, kMeant, kDataError, "2: a second line \"width\""},
                  {"cut off by the end", kWidth + "0 0 0\n# End\n" + kSamples, kMeant, kDataError,
                   "15: the file ends after 1 of 12 samples"},
