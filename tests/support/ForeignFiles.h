@@ -1,42 +1,43 @@
 #pragma once
 
 #include <string>
+#include <utility>
 #include <vector>
 
-#include "lut/RGB.h"
+#include "tests/support/Tables.h"
 
 namespace test {
 
-/// A file as another program writes it, what it means, and what is to be remarked.
+/// The property "interchange".
+enum Mode { kBook, kMeant };
+
+/// What comes of a file.
+struct Outcome {
+    /// The message of a failure; or what the Evaluator gives for colours, "0 1 2 -> .5 .5 1, ...";
+    /// or "", a table that does not matter.
+    Outcome(const char* text);
+    Outcome(const ol::RGB& in, const ol::RGB& out) : colours{{in, out}} {}
+
+    std::vector<std::pair<ol::RGB, ol::RGB>> colours;
+    std::string message = "(no exception)";
+};
+
+/// A file as another program writes it, and what is made of it.
 struct ForeignFile {
     const char* name;
     std::string text;
-    struct Colour {
-        Orlith::LUT::RGB in;
-        Orlith::LUT::RGB out;
-    };
-    std::vector<Colour> colours;
-    std::vector<std::string> remarks = {};
+    Mode mode;
+    Outcome outcome;
+    std::string remarks = {};  ///< all of them, "LINE: text | LINE: text"
 };
 
-/// Expects files to be read as meant.
-void expectLooks(const std::string& extension, const std::vector<ForeignFile>& files);
+/// Reads files with the reader of an extension, and expects all that is said of them.
+void expectOutcomes(const std::string& extension, const std::vector<ForeignFile>& files);
 
-/// A file that is refused, and the last remark: "LINE: reason".
-struct UnreadableFile {
-    const char* name;
-    std::string text;
-    const char* reason;
-};
+/// What the Evaluator gives for a colour.
+ol::RGB evaluated(const boost::shared_ptr<const ol::LUT>& table, const ol::RGB& in);
 
-enum class Mode { Book, Meant };
-
-/// Expects files to be refused for their reasons.
-void expectReasons(const std::string& extension, Mode mode,
-                   const std::vector<UnreadableFile>& files);
-
-/// The remarks on a file, each "LINE: text".
-std::vector<std::string> remarksOn(const std::string& extension, Mode mode,
-                                   const std::string& text);
+/// "LF" as "CR LF".
+std::string withReturns(std::string text);
 
 }  // namespace test

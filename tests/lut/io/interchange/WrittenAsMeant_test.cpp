@@ -2,77 +2,71 @@
 
 #include <gtest/gtest.h>
 
-#include <boost/smart_ptr/make_shared.hpp>
-#include <functional>
+#include <filesystem>
 
-#include "lut/Evaluator.h"
 #include "lut/io/Registry.h"
-#include "lut/property/PropertySet.h"
 #include "tests/support/Files.h"
-#include "tests/support/Tables.h"
+#include "tests/support/ForeignFiles.h"
+#include "tests/support/ThreeDL.h"
 
 namespace {
 
-namespace ol = Orlith::LUT;
-namespace property = Orlith::Property;
+using namespace test;
 
 constexpr char kNoPlace[] = "unable to write: the format has no place for the pre-LUT";
 constexpr char kNoDomain[] = "unable to write: the format has no place for a domain but 0 to 1";
 constexpr char kNoCurve[] = "unable to write: must be a 3D lut";
+constexpr char kUnlike[] = "unable to write: must have the same dimension in r, g and b";
+constexpr char kNoHeight[] = "height: not available";
+constexpr char kFalls[] = "unable to write: the domain does not rise";
 
-template <class Face>
-void goAsMeant(Face& face) {
-    face.setProperty("interchange", property::makeProperty<property::Int>("interchange", 1));
+void writeAsMeant(const std::string& extension, const std::string& file,
+                  const boost::shared_ptr<ol::LUT>& table) {
+    const auto writer = ol::createWriter("", true, extension);
+    setProperty<Orlith::Property::Int>(*writer, "interchange", 1);
+    writer->write(file, table);
 }
 
-/// Writes a table and compares the look of the file with its own, between -0.5 and 2.5.
-/// @return the message of a refusal, or ""
+/// Writes a table and compares the look of the file with its own, between -0.5 and 2.5 and far off
+/// on blue.
+/// @return the message of a refusal, which leaves no file, or ""
 std::string keepsTheLook(const std::string& extension, const boost::shared_ptr<ol::LUT>& table) {
-    const test::TempFolder folder;
+    const TempFolder folder;
     const std::string file = folder.path("table");
-    const auto writer = ol::createWriter("", true, extension);
+    const std::string refusal = messageOf([&] { writeAsMeant(extension, file, table); });
+    if (refusal != "(no exception)") {
+        EXPECT_FALSE(std::filesystem::exists(file));
+        return refusal;
+    }
     const auto reader = ol::createReader("", true, extension);
-    goAsMeant(*writer);
-    goAsMeant(*reader);
-    std::string refusal = test::messageOf([&] { writer->write(file, table); });
-    if (refusal != "(no exception)") return refusal;
-    const ol::Evaluator before(table);
-    const ol::Evaluator after(reader->read(file));
-    EXPECT_TRUE(reader->remarks().empty());
-    for (int i = 0; i < 50; ++i) {
-        const auto step = static_cast<float>(i);
-        const ol::RGB in(-.5F + step * .06F, 2.5F - step * .06F, step * .02F);
-        ol::RGB expected;
-        ol::RGB out;
-        before.apply(in.data_block(), expected.data_block(), 1);
-        after.apply(in.data_block(), out.data_block(), 1);
+    setProperty<Orlith::Property::Int>(*reader, "interchange", 1);
+    const auto read = reader->read(file);
+    // A .csp file says where a table ends.
+    for (const ol::Remark& remark : reader->remarks())
+        EXPECT_NE(remark.text.find("leads beyond 0 to 1"), std::string::npos) << remark.text;
+    for (int i = 0; i < 100; ++i) {
+        const auto step = static_cast<float>(i / 2);
+        const float far = i % 2 == 0 ? 1.0F : 60000.0F;
+        const ol::RGB in(-.5F + step * .06F, 2.5F - step * .06F, step * .02F * far);
+        const ol::RGB expected = evaluated(table, in);
+        const ol::RGB out = evaluated(read, in);
         for (unsigned c = 0; c < 3; ++c)
             EXPECT_NEAR(out[c], expected[c], 2e-6F) << "channel " << c << " of " << in;
     }
     return "";
 }
 
-struct Kind {
-    const char* name;
-    boost::shared_ptr<ol::LUT> table;
-    // What each format says: "" where it holds the table.
-    const char* cube;
-    const char* blut;
-    const char* cms;
-    const char* cub;
-    const char* vf;
-};
-
-boost::shared_ptr<ol::LUT> lattice(const std::function<void(ol::LUT&)>& change) {
-    const auto table = test::markedLattice(5, 5, 5);
-    ol::setUnitDomain(*table, 5, 5, 5);
+/// A table to which a change has happened.
+boost::shared_ptr<ol::LUT> changed(const boost::shared_ptr<ol::LUT>& table,
+                                   void (*change)(ol::LUT&)) {
     change(*table);
     return table;
 }
 
-void setShaper(ol::Shaper& shaper, const std::vector<ol::RGB>& entries) {
-    shaper.entries = entries;
-    shaper.counts.fill(static_cast<float>(entries.size()));
+boost::shared_ptr<ol::LUT> lattice(int height = 5, int depth = 5) {
+    const auto table = markedLattice(5, height, depth, 1000.0F);
+    ol::setUnitDomain(*table, 5, height, depth);
+    return table;
 }
 
 void widenDomain(ol::LUT& table) {
@@ -82,64 +76,92 @@ void widenDomain(ol::LUT& table) {
     }
 }
 
+void setRamps(ol::LUT& table) {
+    table.inputShaper = {{{0, 0, 0}, {.5F, .5F, .5F}, {1, 1, 1}}, {3, 3, 3}};
+    table.outputShaper = table.inputShaper;
+}
+
+void bendOutput(ol::LUT& table) {
+    table.outputShaper = {{{0, 0, 0}, {.2F, .5F, .7F}, {1, .9F, 1.1F}}, {3, 3, 3}};
+}
+
+/// Blue has a step, and ends far away.
+void setInput(ol::LUT& table) {
+    table.inputShaper = {{{-1, 0, 0}, {2, .75F, 0}, {9, 1, 65504}}, {2, 3, 3}};
+}
+
+void setOutput(ol::LUT& table) {
+    table.outputShaper = {{{0, 1, -.25F}, {.5F, 0, .25F}, {.625F, 0, .5F}, {1, 0, 1.5F}},
+                          {4, 2, 4}};
+}
+
+void setEverything(ol::LUT& table) {
+    widenDomain(table);
+    setInput(table);
+    setOutput(table);
+}
+
+void turnGreen(ol::LUT& table) {
+    table.transform[1][1] = -1.0F;
+}
+
 TEST(WrittenAsMeant, KeepsTheLookOrSaysWhyNot) {
-    const std::vector<ol::RGB> ramp{{0, 0, 0}, {.5F, .5F, .5F}, {1, 1, 1}};
-    const std::vector<ol::RGB> bend{{0, 0, 0}, {.2F, .5F, .7F}, {1, .9F, 1.1F}};
-    const auto curve = test::markedCurve(5);
-    widenDomain(*curve);
-    const Kind kinds[] = {
-        {"lattice", lattice([](ol::LUT&) {}), "", "", "", "", ""},
-        {"domain", lattice(widenDomain), "", "", kNoDomain, kNoDomain, kNoDomain},
-        {"pre-LUT", lattice([&](ol::LUT& t) { setShaper(t.outputShaper, bend); }), kNoPlace,
-         kNoPlace, "", "", kNoPlace},
-        {"pre-LUT that changes nothing", lattice([&](ol::LUT& t) {
-             setShaper(t.inputShaper, ramp);
-             setShaper(t.outputShaper, ramp);
-         }),
-         "", "", "", "", ""},
-        {"pre-LUT into a domain", lattice([&](ol::LUT& t) {
-             widenDomain(t);
-             setShaper(t.outputShaper, bend);
-         }),
-         kNoPlace, kNoPlace, "", "", kNoPlace},
-        {"uneven inputs", lattice([&](ol::LUT& t) { setShaper(t.inputShaper, bend); }), kNoPlace,
-         kNoPlace, kNoPlace, kNoPlace, kNoPlace},
-        {"curve", curve, "", "height: not available", kNoCurve, kNoCurve, kNoCurve},
+    const struct {
+        const char* name;
+        boost::shared_ptr<ol::LUT> table;
+        const char* cube;  // its refusal; "" where the format holds the table
+        const char *blut, *cms, *cub, *vf, *csp;
+    } kinds[] = {
+        {"lattice", lattice(), "", "", "", "", "", ""},
+        {"domain", changed(lattice(), widenDomain), "", "", kNoDomain, kNoDomain, kNoDomain, ""},
+        {"falling", changed(lattice(), turnGreen), kFalls, kFalls, kFalls, kFalls, kFalls,
+         "unable to write: the inputs of the table do not rise"},
+        {"pre-LUT", changed(lattice(), bendOutput), kNoPlace, kNoPlace, "", "", kNoPlace, ""},
+        {"pre-LUT that changes nothing", changed(lattice(), setRamps), "", "", "", "", "", ""},
+        {"pre-LUT into a domain", changed(changed(lattice(), bendOutput), widenDomain), kNoPlace,
+         kNoPlace, "", "", kNoPlace, ""},
+        {"uneven inputs", changed(lattice(), setInput), kNoPlace, kNoPlace, kNoPlace, kNoPlace,
+         kNoPlace, ""},
+        {"channels of their own", changed(lattice(), setOutput), kNoPlace, kNoPlace, kNoPlace,
+         kNoPlace, kNoPlace, ""},
+        {"everything on unlike sides", changed(lattice(4, 2), setEverything), kUnlike, kUnlike,
+         kUnlike, kNoPlace, kUnlike, ""},
+        {"curve", changed(markedCurve(5), widenDomain), "", kNoHeight, kNoCurve, kNoCurve, kNoCurve,
+         ""},
+        {"curve with everything", changed(markedCurve(5), setEverything), kNoPlace, kNoHeight,
+         kNoCurve, kNoCurve, kNoCurve, ""},
     };
-    for (const Kind& kind : kinds) {
-        SCOPED_TRACE(kind.name);
-        EXPECT_EQ(keepsTheLook(".cube", kind.table), kind.cube);
-        EXPECT_EQ(keepsTheLook(".blut", kind.table), kind.blut);
-        EXPECT_EQ(keepsTheLook(".cms", kind.table), kind.cms);
-        EXPECT_EQ(keepsTheLook(".cub", kind.table), kind.cub);
-        EXPECT_EQ(keepsTheLook(".vf", kind.table), kind.vf);
+    for (const auto& [name, table, cube, blut, cms, cub, vf, csp] : kinds) {
+        SCOPED_TRACE(name);
+        EXPECT_EQ(keepsTheLook(".cube", table), cube);
+        EXPECT_EQ(keepsTheLook(".blut", table), blut);
+        EXPECT_EQ(keepsTheLook(".cms", table), cms);
+        EXPECT_EQ(keepsTheLook(".cub", table), cub);
+        EXPECT_EQ(keepsTheLook(".vf", table), vf);
+        EXPECT_EQ(keepsTheLook(".csp", table), csp);
     }
 }
 
 TEST(WrittenAsMeant, HasTheDomainBehindTheSize) {
-    const auto curve = test::markedCurve(2);
+    const auto curve = markedCurve(2);
     curve->transform[0][0] = .1F;
     curve->transform[3][1] = -1e-7F;
-    const test::TempFolder folder;
-    const auto writer = ol::createWriter("", true, ".cube");
-    goAsMeant(*writer);
-    writer->write(folder.path("table"), curve);
-    EXPECT_EQ(test::readFile(folder.path("table")),
+    const TempFolder folder;
+    writeAsMeant(".cube", folder.path("table"), curve);
+    EXPECT_EQ(readFile(folder.path("table")),
               "TITLE \"Generated by Orlith::LUT\"\nLUT_1D_SIZE 2\nDOMAIN_MIN 0 -0.0000001 0\n"
               "DOMAIN_MAX 0.1 0.9999999 1\n0.000000 0.100000 0.200000\n"
               "0.000100 0.100100 0.200100\n");
 }
 
 TEST(WrittenAsMeant, HasPreLUTsInUnitsOfTheLattice) {
-    const auto table = lattice([](ol::LUT& t) {
-        setShaper(t.outputShaper, {{0, 0, 0}, {1, 1, .5F}});
-    });
-    const test::TempFolder folder;
+    const auto table = lattice();
+    table->outputShaper.entries = {{0, 0, 0}, {1, 1, .5F}};
+    table->outputShaper.counts.fill(2.0F);
+    const TempFolder folder;
     const auto linesOf = [&](const char* extension, const char* first) {
-        const auto writer = ol::createWriter("", true, extension);
-        goAsMeant(*writer);
-        writer->write(folder.path("table"), table);
-        const std::string text = test::readFile(folder.path("table"));
+        writeAsMeant(extension, folder.path("table"), table);
+        const std::string text = readFile(folder.path("table"));
         return text.substr(text.find(first), 55 + std::string(first).size());
     };
     EXPECT_EQ(linesOf(".cub", "# InputLUT\n"),
