@@ -7,6 +7,7 @@
 
 #include "lut/LUT3D.h"
 #include "lut/io/Registry.h"
+#include "orlith/Command.h"
 #include "orlith/Messages.h"
 #include "orlith/table/Look.h"
 #include "orlith/table/TableFile.h"
@@ -90,7 +91,12 @@ std::string reportGenerated(host::Node& node, Orlith::LUT::LUT3D& table, const G
     addPreLUT(table, node);
     const Options3DL options3DL = extension == ".3dl" ? options3DLOf(node) : Options3DL();
     const double deviation = verify(file.path, file.name, extension, table, options3DL);
-    warnOfOtherLook(file, extension, table);
+    try {
+        warnOfOtherLook(file, extension, table);
+    } catch (const Failure& failure) {
+        // The operator has written what it was given, such as samples that are not finite.
+        warn(fmt::format("{} (as other programs read it)", failure.what()));
+    }
     return summary(file.name, extension, table, fmt::format("largest deviation {:.2g}", deviation));
 }
 

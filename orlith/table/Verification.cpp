@@ -103,13 +103,15 @@ std::string whyUnreadable(const std::string& extension, const ol::LUT& table) {
 std::string clippingText(const ol::LUT& lut, const std::string& extension,
                          const Options3DL& options) {
     if (extension != ".3dl" || !options.clampOutput) return "";
-    // What is nearer than half a code is no loss.
-    const float halfCode = 0.5F / static_cast<float>(std::ldexp(1.0, options.outputBits) - 1.0);
+    Options3DL unclamped = options;
+    unclamped.clampOutput = false;
+    const double codeMax = std::ldexp(1.0, options.outputBits) - 1.0;
     std::uint64_t count = 0;
     float farthest = 0.5F;
     const float* const samples = lut.data();
     for (std::uint64_t i = 0; i < 3 * pointCount(lut); ++i) {
-        if (samples[i] >= -halfCode && samples[i] <= 1.0F + halfCode) continue;
+        const double code = codeOf(static_cast<double>(samples[i]), unclamped);
+        if (code >= -0.5 && code <= codeMax + 0.5) continue;  // half a code is no loss
         ++count;
         if (!(std::fabs(samples[i] - 0.5F) <= std::fabs(farthest - 0.5F))) farthest = samples[i];
     }
