@@ -33,7 +33,7 @@ void writeAsMeant(const std::string& extension, const std::string& file,
 std::string keepsTheLook(const std::string& extension, const boost::shared_ptr<ol::LUT>& table) {
     const TempFolder folder;
     const std::string file = folder.path("table");
-    const std::string refusal = messageOf([&] { writeAsMeant(extension, file, table); });
+    std::string refusal = messageOf([&] { writeAsMeant(extension, file, table); });
     if (refusal != "(no exception)") {
         EXPECT_FALSE(std::filesystem::exists(file));
         return refusal;
@@ -45,7 +45,8 @@ std::string keepsTheLook(const std::string& extension, const boost::shared_ptr<o
     for (const ol::Remark& remark : reader->remarks())
         EXPECT_NE(remark.text.find("leads beyond 0 to 1"), std::string::npos) << remark.text;
     for (int i = 0; i < 100; ++i) {
-        const auto step = static_cast<float>(i / 2);
+        const int pair = i / 2;
+        const auto step = static_cast<float>(pair);
         const float far = i % 2 == 0 ? 1.0F : 60000.0F;
         const ol::RGB in(-.5F + step * .06F, 2.5F - step * .06F, step * .02F * far);
         const ol::RGB expected = evaluated(table, in);

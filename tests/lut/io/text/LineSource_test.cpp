@@ -64,7 +64,8 @@ TEST(LineSource, CutsALineThatIsTooLongAndEndsThere) {
     const std::string longest(ol::LineSource::kLongestLine, 'x');
     for (const std::size_t length : {5, 100001}) {
         const std::string first(length, 'a');
-        EXPECT_TRUE(linesOf(first + "\n" + longest + "x\nb\n") == Lines({first, longest}));
+        const std::string text = std::string(first).append("\n").append(longest).append("x\nb\n");
+        EXPECT_TRUE(linesOf(text) == Lines({first, longest}));
     }
 }
 
