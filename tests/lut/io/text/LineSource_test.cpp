@@ -62,7 +62,7 @@ TEST(LineSource, JoinsLinesAcrossBlocks) {
 
 TEST(LineSource, CutsALineThatIsTooLongAndEndsThere) {
     const std::string longest(ol::LineSource::kLongestLine, 'x');
-    for (const std::size_t length : {5, 100001}) {
+    for (const std::size_t length : {std::size_t{5}, std::size_t{100001}}) {
         const std::string first(length, 'a');
         const std::string text = std::string(first).append("\n").append(longest).append("x\nb\n");
         EXPECT_TRUE(linesOf(text) == Lines({first, longest}));
