@@ -45,9 +45,11 @@ public:
     /// What was taken where it was not clear, such as: holds 3 parts: took part 0 "rgba"; or empty.
     virtual const std::string& remark() const = 0;
 
-    /// Fills the data window: triples red, green, blue, the first line first.
-    /// @throws Error  if the pixels cannot be read whole
-    virtual void readPixels(float* rgb) = 0;
+    /// A line of the data window, counted downward from 0: triples red, green, blue, which stand
+    /// until the next call. Lines may be asked for in any order; going through them from either end
+    /// decodes each part of the file once.
+    /// @throws Error  what is asked for cannot be read, or the file is cut off
+    virtual const float* line(int line) = 0;
 };
 
 /// An image file that is being written; removed at the end unless it is finished.

@@ -8,7 +8,6 @@
 #include <cstdint>
 #include <fstream>
 #include <limits>
-#include <new>
 #include <system_error>
 
 #include "host/Error.h"
@@ -81,36 +80,19 @@ bool ImageFile::isCurrent() const {
            fs::file_size(path_, failure) == byteCount_;
 }
 
-void ImageFile::readPixels() {
-    const std::unique_ptr<ImageReader> source = std::move(source_);
-    if (!source) throw Error(path_, "its pixels could not be read");
-    const auto width = static_cast<std::size_t>(box_.width());
-    const auto height = static_cast<std::size_t>(box_.height());
-    std::unique_ptr<float[]> pixels;
-    try {
-        pixels.reset(new float[width * height * 3]);
-    } catch (const std::bad_alloc&) {
-        throw Error(path_, fmt::format("{} x {} pixels do not fit into memory", width, height));
-    }
-    source->readPixels(pixels.get());
-    pixels_ = std::move(pixels);
-}
-
 void ImageFile::copyRow(int y, int x, int r, zefra::ChannelMask channels, zefra::Row& row) {
-    if (!pixels_) readPixels();
     const bool isInside = y >= box_.y && y < box_.t;
     const int first = std::clamp(box_.x, x, std::max(x, r));
     const int end = std::clamp(box_.r, first, std::max(first, r));
-    const auto line = static_cast<std::size_t>(isInside ? lineOfRow(box_, y) : 0);
-    const auto width = static_cast<std::size_t>(box_.width());
+    const float* const line = isInside ? source_->line(lineOfRow(box_, y)) : nullptr;
 
     for (std::size_t i = 0; i < kChannels.size(); ++i) {
         if ((channels & kChannels[i]) == 0) continue;
         float* const out = row.writable(kChannels[i]);
         const int left = row.left();
         std::fill(out + (x - left), out + (std::max(x, r) - left), 0.0F);
-        if (!isInside) continue;
-        const float* const in = pixels_.get() + line * width * 3 + i;
+        if (line == nullptr) continue;
+        const float* const in = line + i;
         for (int column = first; column < end; ++column)
             out[column - left] = in[static_cast<std::size_t>(column - box_.x) * 3];
     }

@@ -17,7 +17,8 @@ namespace host {
 ///          of the file, so a data window that starts elsewhere gives a box that starts elsewhere.
 /// Channels those of the chosen part and layer that the file names R, G and B, otherwise the first
 ///          three.
-/// Memory   12 bytes a pixel, from the first row asked for.
+/// Memory   as the file allows, from the first row asked for: a few blocks of lines where any line
+///          can be decoded without those before it, otherwise the image in its own sample type.
 class ImageFile {
 public:
     /// Reads what the file says about itself.
@@ -33,19 +34,16 @@ public:
     bool isCurrent() const;
 
     /// Fills pixels x to r - 1 of row y; those outside the box are black.
-    /// @throws Error  if the file's pixels cannot be read whole
+    /// @throws Error  if they cannot be read, or the file is cut off
     void copyRow(int y, int x, int r, zefra::ChannelMask channels, zefra::Row& row);
 
 private:
-    void readPixels();
-
     std::string path_;
     std::filesystem::file_time_type time_;
     std::uintmax_t byteCount_ = 0;
     zefra::Box box_;
     std::string remark_;
-    std::unique_ptr<ImageReader> source_;  // gone once its pixels are here
-    std::unique_ptr<float[]> pixels_;      // r g b; the file's first line first
+    std::unique_ptr<ImageReader> source_;
 };
 
 /// Writes an image row by row. A file that could not be written whole is removed.

@@ -2,6 +2,9 @@
 
 #include <tcl.h>
 
+#include <cstdarg>
+#include <cstdio>
+#include <cstdlib>
 #include <exception>
 
 #include "host/Cancel.h"
@@ -56,6 +59,20 @@ void extendTimeUnlessCancelled(ClientData, Tcl_Interp* interpreter) {
     if (!cancelRequested()) extendTime(interpreter);
 }
 
+/// Called by Tcl where it cannot go on: a text outgrows it, or the memory. It may neither return
+/// nor throw through Tcl, so this is the end of the program, but not by a crash.
+[[noreturn]] void endProgram(const char* format, ...) __attribute__((format(printf, 1, 2)));
+void endProgram(const char* format, ...) {
+    char text[512];
+    va_list arguments;
+    va_start(arguments, format);
+    std::vsnprintf(text, sizeof text, format, arguments);
+    va_end(arguments);
+    std::fflush(stdout);
+    std::fprintf(stderr, "orlith: error: the script: %s\n", oneLine(text).c_str());
+    std::_Exit(EXIT_FAILURE);
+}
+
 }  // namespace
 
 void TclInterpreter::Delete::operator()(Tcl_Interp* interpreter) const {
@@ -64,6 +81,7 @@ void TclInterpreter::Delete::operator()(Tcl_Interp* interpreter) const {
 
 TclInterpreter::TclInterpreter() {
     static const bool isTclStarted = [] {
+        Tcl_SetPanicProc(endProgram);
         Tcl_FindExecutable(nullptr);
         return true;
     }();

@@ -1,14 +1,21 @@
 #include <OpenImageIO/filesystem.h>
 #include <OpenImageIO/imageio.h>
 
+#include <fmt/format.h>
+
 #include <algorithm>
+#include <cstddef>
 #include <fstream>
 #include <iterator>
+#include <new>
 #include <string_view>
 #include <utility>
 
 #include "host/Error.h"
+#include "host/openimageio/Bands.h"
+#include "host/openimageio/Blocks.h"
 #include "host/openimageio/Codec.h"
+#include "host/openimageio/HeldImage.h"
 #include "host/openimageio/Parts.h"
 
 namespace host::openimageio {
@@ -67,17 +74,15 @@ public:
     const ImageFrame& frame() const override { return frame_; }
     const std::string& remark() const override { return chosen_.remark; }
 
-    void readPixels(float* rgb) override {
-        if (formatName() == "jpeg") expectWholeJPEG(path_);
-        const auto [red, green, blue] = chosen_.channels;
-        if (green == red + 1 && blue == red + 2) {
-            readChannels(red, 3, rgb);
-        } else {
-            readChannels(red, 1, rgb);
-            readChannels(green, 1, rgb + 1);
-            readChannels(blue, 1, rgb + 2);
+    const float* line(int line) override {
+        try {
+            if (!lines_) lines_ = openLines();
+            return lines_->line(line);
+        } catch (const std::bad_alloc&) {
+            const OIIO::ImageSpec& spec = chosen_.spec;
+            throw Error(path_, fmt::format("{} x {} pixels do not fit into memory", spec.width,
+                                           spec.height));
         }
-        if (file_ && file_->wasShort()) throw Error(path_, "is cut off");
     }
 
 private:
@@ -92,13 +97,59 @@ private:
         }
     }
 
-    void readChannels(int first, int count, float* target) {
-        constexpr OIIO::stride_t kPixelBytes = 3 * sizeof(float);
-        if (!input_->read_image(chosen_.part, 0, first, first + count, OIIO::TypeFloat, target,
-                                kPixelBytes) ||
-            input_->has_error()) {  // TIFF: strips that are not there, and still a good result
-            failReading(path_, input_->geterror());
+    std::unique_ptr<Lines> openLines() {
+        const OIIO::ImageSpec& spec = chosen_.spec;
+        const int blockLines = blockLinesOf(spec, formatName());
+        if (blockLines > 0) {
+            return std::make_unique<Bands>(
+                spec.width, spec.height, blockLines,
+                [this](int first, int end, float* rgb) { readLines(first, end, rgb); });
         }
+        if (formatName() == "jpeg") expectWholeJPEG(path_);
+        return std::make_unique<HeldImage>(spec.width, spec.height, spec.format,
+                                           [this](void* rgb) { readImage(rgb); });
+    }
+
+    void readLines(int first, int end, float* rgb) {
+        const OIIO::ImageSpec& spec = chosen_.spec;
+        const int top = spec.y + first;
+        const int bottom = spec.y + end;
+        readChannels(OIIO::TypeFloat, rgb, [&](int channel, int channelEnd, void* target) {
+            constexpr OIIO::stride_t kPixelBytes = 3 * sizeof(float);
+            if (spec.tile_width == 0) {
+                return input_->read_scanlines(chosen_.part, 0, top, bottom, spec.z, channel,
+                                              channelEnd, OIIO::TypeFloat, target, kPixelBytes);
+            }
+            return input_->read_tiles(chosen_.part, 0, spec.x, spec.x + spec.width, top, bottom,
+                                      spec.z, spec.z + 1, channel, channelEnd, OIIO::TypeFloat,
+                                      target, kPixelBytes);
+        });
+    }
+
+    void readImage(void* rgb) {
+        const OIIO::TypeDesc type = chosen_.spec.format;
+        readChannels(type, rgb, [&](int channel, int channelEnd, void* target) {
+            return input_->read_image(chosen_.part, 0, channel, channelEnd, type, target,
+                                      static_cast<OIIO::stride_t>(3 * type.size()));
+        });
+        input_.reset();  // formats keep what they have decoded
+    }
+
+    /// Has channels read so that triples of red, green and blue come out.
+    /// @param read  reads channels first to end - 1 to where the first pixel's are
+    template <typename Read>
+    void readChannels(OIIO::TypeDesc type, void* rgb, const Read& read) {
+        const auto [red, green, blue] = chosen_.channels;
+        const bool isTogether = green == red + 1 && blue == red + 2;
+        for (std::size_t i = 0; i < chosen_.channels.size(); i += isTogether ? 3 : 1) {
+            const int channel = chosen_.channels[i];
+            auto* const target = static_cast<std::byte*>(rgb) + i * type.size();
+            if (!read(channel, channel + (isTogether ? 3 : 1), target) ||
+                input_->has_error()) {  // TIFF: strips that are not there, and still a good result
+                failReading(path_, input_->geterror());
+            }
+        }
+        if (file_ && file_->wasShort()) throw Error(path_, "is cut off");
     }
 
     const std::string path_;
@@ -106,6 +157,7 @@ private:
     std::unique_ptr<OIIO::ImageInput> input_;
     ChosenImage chosen_;
     ImageFrame frame_;
+    std::unique_ptr<Lines> lines_;  // from the first line asked for
 };
 
 }  // namespace

@@ -3,7 +3,9 @@
 #include <OpenImageIO/filesystem.h>
 #include <fmt/format.h>
 
+#include <cerrno>
 #include <filesystem>
+#include <fstream>
 #include <iterator>
 #include <string_view>
 #include <system_error>
@@ -55,6 +57,30 @@ private:
     fs::path path_;
 };
 
+/// Makes sure that the types can be tried: else what the system refuses looks like a type that a
+/// format does not hold.
+void expectTemporaryFolder(const std::string& path) {
+    constexpr std::size_t kByteCount = 65536;  // more than any of the small files
+    fs::path folder;
+    std::error_code failure;
+    try {
+        folder = fs::temp_directory_path();
+        const TemporaryPath probe("");
+        errno = 0;
+        std::ofstream file(probe.string(), std::ios::binary);
+        file << std::string(kByteCount, '\0');
+        file.close();
+        if (!file) failure = {errno != 0 ? errno : EIO, std::generic_category()};
+    } catch (const fs::filesystem_error& error) {
+        folder = error.path1();
+        failure = error.code();
+    }
+    if (failure) {
+        throw Error(path, fmt::format("sample types are tried in the temporary folder {}: {}",
+                                      folder.string(), failure.message()));
+    }
+}
+
 /// Whether a file of that extension, asked for a type, has it.
 bool formatHolds(const fs::path& extension, const SampleType& type) {
     constexpr int kSide = 16;  // no format is too coarse for it
@@ -93,6 +119,7 @@ int codeMaxOf(const std::string& type) {
 
 void expectFormatHolds(const std::string& path, const std::string& type) {
     const fs::path extension = fs::path(path).extension();
+    expectTemporaryFolder(path);
     std::vector<std::string_view> held;
     for (const SampleType& each : kTypes) {
         if (formatHolds(extension, each)) held.push_back(each.name);

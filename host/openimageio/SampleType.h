@@ -15,7 +15,8 @@ int codeMaxOf(const std::string& type);
 
 /// Makes sure that the format of a file name holds a sample type, by writing and reading a few
 /// pixels elsewhere: the library takes the nearest that the format has, and does not say so.
-/// @throws Error  with the types that the format holds
+/// @throws Error  with the types that the format holds; the folder for temporary files and why
+///                nothing can be written there
 void expectFormatHolds(const std::string& path, const std::string& type);
 
 }  // namespace host::openimageio

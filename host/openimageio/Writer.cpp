@@ -17,10 +17,6 @@ namespace {
 
 namespace fs = std::filesystem;
 
-[[noreturn]] void failWriting(const std::string& path, const std::string& reason) {
-    fail(path, reason, "cannot be written");
-}
-
 /// By another type name than "file", so that formats write through it: libjpeg, given the file
 /// itself, ends the program when the disk is full.
 class FileProxy final : public OIIO::Filesystem::IOFile {
@@ -58,18 +54,24 @@ public:
     /// A format has opened the file by itself.
     void started() { isStarted_ = true; }
 
+    /// @throws Error  bytes have not arrived, whatever the format makes of that
+    void expectTaken() const {
+        if (file_ && std::ferror(file_.get()) != 0) failWhole();
+    }
+
     /// The format is done.
     void finish() {
         proxy_.reset();
-        const bool hasFailed = file_ && std::ferror(file_.get()) != 0;
-        const bool isClosed = !file_ || std::fclose(file_.release()) == 0;
-        if (hasFailed || !isClosed) {
-            throw Error(path_, "cannot be written whole; the disk may be full");
-        }
+        expectTaken();
+        if (file_ && std::fclose(file_.release()) != 0) failWhole();
         isFinished_ = true;
     }
 
 private:
+    [[noreturn]] void failWhole() const {
+        throw Error(path_, "cannot be written whole; the disk may be full");
+    }
+
     struct Close {
         void operator()(std::FILE* file) const { std::fclose(file); }
     };
@@ -104,12 +106,10 @@ public:
           codeMax_(static_cast<float>(codeMaxOf(sampleType))),
           file_(path) {
         format_ = OIIO::ImageOutput::create(path_);
-        if (!format_) failWriting(path_, OIIO::geterror());
+        if (!format_) fail(path_, OIIO::geterror(), kUnexplained);
         if (!sampleType.empty()) expectFormatHolds(path_, sampleType);
         if (format_->supports("ioproxy")) format_->set_ioproxy(file_.open());
-        if (!format_->open(path_, specOf(frame, format_->format_name(), sampleType))) {
-            failWriting(path_, format_->geterror());
-        }
+        if (!format_->open(path_, specOf(frame, format_->format_name(), sampleType))) failWriting();
         file_.started();
     }
 
@@ -121,17 +121,23 @@ public:
                 each = std::round(each * codeMax_) / codeMax_;
             samples = codes_.data();
         }
-        if (!format_->write_scanline(line_++, 0, OIIO::TypeFloat, samples)) {
-            failWriting(path_, format_->geterror());
-        }
+        if (!format_->write_scanline(line_++, 0, OIIO::TypeFloat, samples)) failWriting();
     }
 
     void finish() override {
-        if (!format_->close()) failWriting(path_, format_->geterror());
+        if (!format_->close()) failWriting();
         file_.finish();
     }
 
 private:
+    static constexpr const char* kUnexplained = "cannot be written";
+
+    /// The format's words, unless the system is to blame: TIFF calls a full disk a bad directory.
+    [[noreturn]] void failWriting() const {
+        file_.expectTaken();
+        fail(path_, format_->geterror(), kUnexplained);
+    }
+
     const std::string path_;
     int line_;                 // the next one
     std::size_t sampleCount_;  // in a line

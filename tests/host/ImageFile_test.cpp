@@ -124,6 +124,67 @@ TEST_F(ImageFileTest, TakesTheImageThatIsChosenOrMeant) {
     }
 }
 
+TEST_F(ImageFileTest, GivesRowsInAnyOrderHoweverTheFileIsLaidOut) {
+    constexpr int kWidth = 900;  // several bands of lines
+    constexpr int kHeight = 500;
+    const struct {
+        const char *name, *extension, *compression, *attribute, *value;
+        int tileSide;
+    } kCases[] = {
+        {"blocks of 16", ".exr", "zip", "", "", 0},
+        {"blocks of 256", ".exr", "dwab", "", "", 0},
+        {"last line first", ".exr", "zips", "openexr:lineOrder", "decreasingY", 0},
+        {"tiles", ".exr", "piz", "", "", 64},
+        {"strips of 7", ".tif", "zip", "tiff:RowsPerStrip", "7", 0},
+        {"one strip", ".tif", "none", "tiff:RowsPerStrip", "500", 0},
+        {"one plane a channel", ".tif", "lzw", "planarconfig", "separate", 0},
+        {"tiles", ".tif", "zip", "", "", 64},
+    };
+    // Exact as halves, too.
+    const auto value = [](int column, int line, int channel) {
+        return static_cast<float>((column % 5 + 7 * line + 2 * channel) % 512);
+    };
+    std::vector<float> samples;
+    for (int i = 0; i < 3 * kWidth * kHeight; ++i)
+        samples.push_back(value(i / 3 % kWidth, i / 3 / kWidth, i % 3));
+
+    for (const auto& each : kCases) {
+        SCOPED_TRACE(std::string(each.name) + each.extension);
+        const std::string path = folder_.path(std::string("laid-out") + each.extension);
+        OIIO::ImageSpec spec(kWidth, kHeight, 3, OIIO::TypeFloat);
+        spec.tile_width = spec.tile_height = each.tileSide;
+        spec["compression"] = each.compression;
+        const std::string number = each.value;
+        if (number.find_first_not_of("0123456789") == std::string::npos && !number.empty()) {
+            spec[each.attribute] = std::stoi(number);
+        } else if (*each.attribute != '\0') {
+            spec[each.attribute] = number;
+        }
+        const auto output = OIIO::ImageOutput::create(path);
+        ASSERT_TRUE(output->open(path, spec) &&
+                    output->write_image(OIIO::TypeFloat, samples.data()) && output->close());
+        {
+            host::ImageFile image(path);
+            zefra::Row row(0, kWidth);
+            const bool isLossy = std::string(each.compression) == "dwab";
+            for (const int y : {3, 499, 250, 10, 17, 16, 0, 400}) {
+                image.copyRow(y, 0, kWidth, zefra::kRGB, row);
+                for (int x = 0; x < kWidth; ++x) {
+                    ASSERT_NEAR(row.pixels(zefra::kRed)[x], value(x, 499 - y, 0), isLossy ? 8 : 0);
+                    ASSERT_NEAR(row.pixels(zefra::kBlue)[x], value(x, 499 - y, 2), isLossy ? 8 : 0);
+                }
+            }
+        }
+        std::filesystem::resize_file(path, std::filesystem::file_size(path) * 9 / 10);
+        EXPECT_EQ(failureOf([&] {
+                      host::ImageFile image(path);
+                      zefra::Row row(0, 1);
+                      image.copyRow(250, 0, 1, zefra::kRGB, row);
+                  }).find(path + ": "),
+                  0U);
+    }
+}
+
 TEST_F(ImageFileTest, KeepsTheDataWindowWhereTheFileHasIt) {
     const std::string path = folder_.path("window.exr");
     OIIO::ImageSpec spec = markedSpec({"R", "G", "B"});
