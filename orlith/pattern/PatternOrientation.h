@@ -3,6 +3,7 @@
 #include <string>
 #include <vector>
 
+#include "lut/LUT3D.h"
 #include "orlith/pattern/PatchExtent.h"
 
 namespace orlith {
@@ -36,5 +37,15 @@ double paddingGap(const PatchBorder& border, int points);
 ///
 /// @param points  of the pattern that has as many columns and rows, or as many rows and columns
 std::vector<std::string> findOrientations(const PatchBorder& border, int points);
+
+/// What was probably done to a pattern without padding: colours that are neighbours in the cube are
+/// nearer to each other if it is undone, by more than any sensible look can make them. None where
+/// the pattern may be upright, and where there is padding.
+///
+/// Two at a time, of which one is the other and a turn by 180 degrees. That alone is not seen: it
+/// is the pattern of a look that reverses all three axes, as a negative does.
+///
+/// @param table  the centres of the patches, taken as if the pattern were upright
+std::vector<std::string> findSmootherOrientations(const Orlith::LUT::LUT3D& table);
 
 }  // namespace orlith

@@ -152,8 +152,9 @@ private:
     void checkOrientation() {
         if (size_.isUpright()) {
             const auto names = findOrientations(border_, size_.points);
-            if (names.empty()) return warnOfPadding();
-            refuseOrientation(size_.points, names);
+            if (!names.empty()) return refuseOrientation(size_.points, names);
+            warnOfPadding();
+            warnOfOrientation();
         } else if (size_.isOnItsSide()) {
             auto names = findOrientations(border_, size_.pointsOfSide());
             if (names.empty()) names = {"turned by 90 degrees", "transposed"};
@@ -175,6 +176,14 @@ private:
                 "and differs by {:.2g} (a vignette, a logo, or the pattern of another program?)",
                 gap));
         }
+    }
+
+    /// Of a pattern that no padding holds upright.
+    void warnOfOrientation() {
+        const auto names = findSmootherOrientations(*reading_.table);
+        if (names.empty()) return;
+        warn(fmt::format("its pattern of {} points seems to be {}: its colours would be in order",
+                         size_.points, fmt::join(names, " or ")));
     }
 
     void warnOfPatches() {

@@ -1,5 +1,6 @@
 #include "orlith/pattern/PatternReading.h"
 
+#include <array>
 #include <cmath>
 #include <functional>
 #include <limits>
@@ -175,6 +176,73 @@ TEST_F(PatternReadingTest, LooksAtPatternsBeforeTheyAreBelieved) {
         EXPECT_EQ(words, each.words.empty() ? "" : "p: " + each.words);
         EXPECT_EQ(isRefused, each.isRefused);
     }
+}
+
+TEST_F(PatternReadingTest, SeesByItsColoursHowAPatternWithoutPaddingLies) {
+    constexpr int kLast = 55;  // 4 points: 8 x 8 patches
+    using Look = std::function<Pixel(const Pixel&)>;
+    const Look kLooks[] = {
+        [](const Pixel& in) { return in; },
+        [](const Pixel& in) {
+            return Pixel{1 - in.g, 1 - in.b, 1 - in.r};
+        },
+        [](const Pixel& in) {
+            return Pixel{in.r * in.r, in.r / 4 + in.g / 2, in.b - in.r / 3};
+        },
+    };
+    const struct {
+        std::function<std::array<int, 2>(int x, int y)> place;
+        const char* how;
+    } kCases[] = {
+        {[](int x, int y) {
+             return std::array{x, y};
+         },
+         ""},
+        {[](int x, int y) {
+             return std::array{kLast - x, kLast - y};
+         },
+         ""},
+        {[](int x, int y) {
+             return std::array{kLast - x, y};
+         },
+         "mirrored left to right or mirrored top to bottom"},
+        {[](int x, int y) {
+             return std::array{x, kLast - y};
+         },
+         "mirrored left to right or mirrored top to bottom"},
+        {[](int x, int y) {
+             return std::array{kLast - y, x};
+         },
+         "turned by 90 degrees clockwise or turned by 90 degrees counterclockwise"},
+        {[](int x, int y) {
+             return std::array{y, x};
+         },
+         "transposed or turned by 180 degrees and transposed"},
+    };
+    const auto warningOf = [&](const FunctionImage::Function& pixel) {
+        const auto pattern = read({0, 0, kLast + 1, kLast + 1}, pixel);
+        return pattern.warnings.empty() ? "" : pattern.warnings.front();
+    };
+    for (const auto& each : kCases) {
+        for (const Look& look : kLooks) {
+            const std::string words = warningOf([&](int x, int y) {
+                const auto [column, row] = each.place(x, y);
+                const int index = row / 7 * 8 + column / 7;
+                const auto value = [&](int point) { return static_cast<float>(point % 4) / 3; };
+                return look({value(index), value(index / 4), value(index / 16)});
+            });
+            EXPECT_EQ(words, *each.how == '\0'
+                                 ? ""
+                                 : std::string("p: its pattern of 4 points seems to be ") +
+                                       each.how + ": its colours would be in order");
+        }
+    }
+    EXPECT_EQ(warningOf([](int, int) { return Pixel{0.3F, 0.3F, 0.3F}; }), "");
+    EXPECT_EQ(warningOf([](int x, int y) {
+                  const auto noise = static_cast<float>((x / 7 * 131 + y / 7 * 8171) * 977 % 1009);
+                  return Pixel{noise, -noise, noise / 2};
+              }),
+              "");
 }
 
 TEST_F(PatternReadingTest, TakesCentresByForce) {
