@@ -72,7 +72,7 @@ void expectTemporaryFolder(const std::string& path) {
         file.close();
         if (!file) failure = {errno != 0 ? errno : EIO, std::generic_category()};
     } catch (const fs::filesystem_error& error) {
-        folder = error.path1();
+        folder = "TMPDIR";  // which names none
         failure = error.code();
     }
     if (failure) {

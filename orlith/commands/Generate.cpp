@@ -12,6 +12,7 @@
 #include "orlith/Messages.h"
 #include "orlith/Options.h"
 #include "orlith/OutputFile.h"
+#include "orlith/pattern/FlatPattern.h"
 #include "orlith/pattern/PatternReading.h"
 #include "orlith/table/TableFile.h"
 #include "orlith/table/Verification.h"
@@ -135,6 +136,8 @@ int runGenerate(const GenerateOptions& options) {
     }
     const std::string unreadable = whyUnreadable(formatWritten(generate, path), *pattern.table);
     if (!unreadable.empty()) throw Failure(fmt::format("{}: {}", path, unreadable));
+    FlatPattern centres(read, image.box(), *pattern.table);
+    generate.image()->setInput(0, &centres);
     OutputFile output(path);
     setStage(generate, output);
     execute(generate, output);

@@ -87,7 +87,7 @@ private:
 // By so much are neighbours nearer to each other in the right orientation: 1.22 times (4 points) to
 // 1.6 times (121) in a pattern that was mirrored, more in one that was turned. In a wrong one it
 // takes a look of several waves along an axis to have them 1.1 times nearer.
-constexpr double kClearlySmoother = 1.2;
+constexpr double kClearlySmoother = 1.15;
 
 /// Where each point's sample stands in a table that was read upright from a square pattern.
 std::vector<std::size_t> placesOf(int points, const Orientation& orientation) {

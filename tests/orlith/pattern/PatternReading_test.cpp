@@ -187,7 +187,7 @@ TEST_F(PatternReadingTest, SeesByItsColoursHowAPatternWithoutPaddingLies) {
             return Pixel{1 - in.g, 1 - in.b, 1 - in.r};
         },
         [](const Pixel& in) {
-            return Pixel{in.r * in.r, in.r / 4 + in.g / 2, in.b - in.r / 3};
+            return Pixel{in.r * in.r, in.g, in.b - in.r / 3};
         },
     };
     const struct {
