@@ -6,10 +6,10 @@
 #include <boost/smart_ptr/make_shared.hpp>
 
 #include "lut/LUT3D.h"
+#include "lut/evaluation/Look.h"
 #include "lut/io/Registry.h"
 #include "orlith/Command.h"
 #include "orlith/Messages.h"
-#include "orlith/table/Look.h"
 #include "orlith/table/TableFile.h"
 #include "orlith/table/Verification.h"
 #include "orlith/table/WriteOptions.h"
@@ -58,7 +58,7 @@ void warnOfOtherLook(const Generated& file, const std::string& extension,
     std::copy_n(table.data(), 3 * pointCount(table), look->data());
     Orlith::LUT::setUnitDomain(*look, look->width(), look->height(), look->depth());
     const Orlith::LUT::Evaluator meant(look);
-    LookComparison comparison(read, meant);
+    Orlith::LUT::LookComparison comparison(read, meant);
     forEachInput(*look, false, [&](const auto& colour) { comparison.add(colour); });
     const double deviation = largestOf(comparison.finish());
     constexpr double kFormatPrecision = 1e-5;

@@ -33,6 +33,8 @@ constexpr std::size_t kBLUTRangeOffset = 16;
 constexpr std::size_t kBLUTSizeOffset = 43;
 constexpr std::size_t kBLUTTypeOffset = 44;
 
+constexpr int kBLUTMostPoints = 127;  // a side, in a signed byte
+
 constexpr unsigned char kBLUTCurve = 1;
 constexpr unsigned char kBLUTFloats = 'f';
 constexpr unsigned char kBLUTHalves = 'h';

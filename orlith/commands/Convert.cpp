@@ -2,15 +2,16 @@
 
 #include <cerrno>
 #include <cmath>
+#include <stdexcept>
 
 #include "lut/Exception.h"
+#include "lut/evaluation/Look.h"
 #include "lut/io/Registry.h"
+#include "lut/io/interchange/Fitting.h"
 #include "orlith/Command.h"
 #include "orlith/Messages.h"
 #include "orlith/Options.h"
 #include "orlith/OutputFile.h"
-#include "orlith/table/Fitting.h"
-#include "orlith/table/Look.h"
 #include "orlith/table/TableFile.h"
 #include "orlith/table/Verification.h"
 #include "orlith/table/WriteOptions.h"
@@ -80,11 +81,16 @@ void writeTable(ol::LUTFileWriter& writer, const OutputFile& output, const std::
     }
 }
 
+std::string rangeText(const ol::Range& range) {
+    return fmt::format("{:.6g} {:.6g} {:.6g} to {:.6g} {:.6g} {:.6g}", range.min[0], range.min[1],
+                       range.min[2], range.max[0], range.max[1], range.max[2]);
+}
+
 /// How far the file's look is from that of the table that it was made of: at the points of both,
 /// half-way between the file's, and at random colours, within the domain that both have.
 double lookDeviation(const boost::shared_ptr<ol::LUT>& source,
                      const boost::shared_ptr<ol::LUT>& written) {
-    const Domain domain = intersection(domainOf(*source), domainOf(*written));
+    const ol::Range domain = intersection(inputRangeOf(*source), inputRangeOf(*written));
     const auto isInside = [&](const ol::RGB& colour) {
         for (unsigned c = 0; c < 3; ++c) {
             if (!(colour[c] >= domain.min[c] && colour[c] <= domain.max[c])) return false;
@@ -93,7 +99,7 @@ double lookDeviation(const boost::shared_ptr<ol::LUT>& source,
     };
     const ol::Evaluator a(source);
     const ol::Evaluator b(written);
-    LookComparison comparison(a, b);
+    ol::LookComparison comparison(a, b);
     const auto addInside = [&](const ol::RGB& colour) {
         if (isInside(colour)) comparison.add(colour);
     };
@@ -102,7 +108,8 @@ double lookDeviation(const boost::shared_ptr<ol::LUT>& source,
     forEachInput(*source, false, addInside);
     for (const ol::RGB& entry : source->inputShaper.entries)
         addInside(entry);
-    forEachRandom(domain, kRandomColours, [&](const ol::RGB& colour) { comparison.add(colour); });
+    forEachRandom(domain, ol::kRandomColours,
+                  [&](const ol::RGB& colour) { comparison.add(colour); });
     return largestOf(comparison.finish());
 }
 
@@ -128,7 +135,7 @@ double precisionOf(const std::string& extension, const Options3DL& options, cons
 /// @return the summary's words
 std::string compareLooks(const OutputFile& output, const std::string& extension,
                          const ConvertOptions& options, const Options3DL& options3DL,
-                         const boost::shared_ptr<ol::LUT>& source, const Fitted& fitted,
+                         const boost::shared_ptr<ol::LUT>& source, const ol::Fitted& fitted,
                          const std::string& clipping) {
     const Table back =
         readTable(output.stagedPath(), readingOf(extension, options3DL), output.name());
@@ -143,7 +150,7 @@ std::string compareLooks(const OutputFile& output, const std::string& extension,
     const bool isPrecise = deviation <= precisionOf(extension, options3DL, *fitted.lut);
     if (!isPrecise && causes.empty()) {
         // A steep shaper or a tiny domain takes more digits than a line of text has.
-        if (whyNotHeld(*fitted.lut, ".vf").empty()) {
+        if (ol::whyNotHeld(*fitted.lut, ".vf").empty()) {
             throw Failure(
                 fmt::format("{}: read back, its look is off by {:.2g}", output.name(), deviation));
         }
@@ -153,18 +160,18 @@ std::string compareLooks(const OutputFile& output, const std::string& extension,
     return fmt::format("{} ({})", words, fmt::join(causes, "; "));
 }
 
-Fitted fitTo(const ConvertOptions& options, const boost::shared_ptr<ol::LUT>& lut,
-             const std::string& extension) {
+ol::Fitted fitTo(const ConvertOptions& options, const boost::shared_ptr<ol::LUT>& lut,
+                 const std::string& extension) {
     try {
         return fit(lut, extension, options.size);
-    } catch (const Failure& failure) {
-        throw Failure(fmt::format("{}: {}", options.output, failure.what()));
+    } catch (const std::invalid_argument& problem) {
+        throw Failure(fmt::format("{}: {}", options.output, problem.what()));
     }
 }
 
 /// By the book only samples are sure to be written.
 void warnOfLosses(const std::string& name, const std::string& extension, const ol::LUT& lut) {
-    const std::string lost = whyNotHeld(lut, extension);
+    const std::string lost = ol::whyNotHeld(lut, extension);
     if (lost != "a shaper" && lost != "its domain") return;
     warn(fmt::format("{}: a {} file does not hold the table's {}", name, extension,
                      lost == "a shaper" ? "pre-LUT" : "domain"));
@@ -184,12 +191,12 @@ int runConvert(const ConvertOptions& options) {
     const bool isByBook = options.reading.isStrict || options.writing.hasPreLUT();
     setFlag(*writer, "interchange", isByBook ? 0 : 1);
 
-    if (options.writing.hasPreLUT() && !takesRamp(extension)) {
+    if (options.writing.hasPreLUT() && !ol::takesRamp(extension)) {
         throw UsageError("--lut1d and --style1d are for .cms and .cub files");
     }
     const Table table = readWholeTable(options.input, options.reading);
     dropIdentityPreLUT(*table.lut);
-    Fitted fitted{table.lut, "", ""};
+    ol::Fitted fitted{table.lut, "", false};
     if (options.reading.isStrict) {
         warnOfLosses(options.output, extension, *table.lut);
     } else {
@@ -201,8 +208,10 @@ int runConvert(const ConvertOptions& options) {
 
     OutputFile output(options.output);
     writeTable(*writer, output, extension, fitted.lut);
-    if (!fitted.domainChange.empty()) {
-        warn(fmt::format("{}: its domain changes {}", output.name(), fitted.domainChange));
+    if (fitted.losesInputs) {
+        warn(fmt::format("{}: its domain changes from {}, to {}", output.name(),
+                         rangeText(inputRangeOf(*table.lut)),
+                         rangeText(inputRangeOf(*fitted.lut))));
     }
     std::string words = output.whyNotReadBack(options.skipsVerification);
     if (words.empty()) words = unreadable;

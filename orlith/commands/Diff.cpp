@@ -4,13 +4,13 @@
 #include <cmath>
 #include <cstdint>
 
+#include "lut/evaluation/Look.h"
 #include "lut/io/Lattice.h"
 #include "orlith/Command.h"
 #include "orlith/Json.h"
 #include "orlith/Options.h"
 #include "orlith/table/ColourOptions.h"
 #include "orlith/table/Facts.h"
-#include "orlith/table/Look.h"
 #include "orlith/table/TableFile.h"
 
 namespace orlith {
@@ -36,8 +36,8 @@ bool sameSize(const ol::LUT& a, const ol::LUT& b) {
 
 /// By the book: sample by sample; where sizes differ, at the points of the larger table, where the
 /// other is interpolated, beyond its domain in straight lines.
-Differences compareSamples(const Table& a, const Table& b) {
-    Differences differences;
+ol::Differences compareSamples(const Table& a, const Table& b) {
+    ol::Differences differences;
     const bool isALarger = a.pointCount >= b.pointCount;
     const ol::LUT& larger = isALarger ? *a.lut : *b.lut;
     const ol::LUT& smaller = isALarger ? *b.lut : *a.lut;
@@ -63,34 +63,34 @@ Differences compareSamples(const Table& a, const Table& b) {
 }
 
 /// As people see it: at the points of the larger table and at random colours of both.
-Differences compareLooks(const Table& a, const Table& b, const ColourOptions& colours) {
+ol::Differences compareLooks(const Table& a, const Table& b, const ColourOptions& colours) {
     const ol::Evaluator evaluatorA = colours.evaluator(a.lut);
     const ol::Evaluator evaluatorB = colours.evaluator(b.lut);
-    LookComparison comparison(evaluatorA, evaluatorB);
+    ol::LookComparison comparison(evaluatorA, evaluatorB);
     const auto add = [&](const ol::RGB& colour) { comparison.add(colour); };
     forEachInput(a.pointCount >= b.pointCount ? *a.lut : *b.lut, false, add);
-    forEachRandom(domainOf(*a.lut), kRandomColours / 2, add);
-    forEachRandom(domainOf(*b.lut), kRandomColours / 2, add);
+    forEachRandom(inputRangeOf(*a.lut), ol::kRandomColours / 2, add);
+    forEachRandom(inputRangeOf(*b.lut), ol::kRandomColours / 2, add);
     return comparison.finish();
 }
 
-void printText(const Differences& differences) {
+void printText(const ol::Differences& differences) {
     fmt::print("{:<8}{:>14}{:>14}{:>14}  {}\n", "", "largest", "mean", "rms", "largest at");
     for (unsigned c = 0; c < 3; ++c) {
-        const Difference& each = differences[c];
+        const ol::Difference& each = differences[c];
         fmt::print("{:<8}{:>14.6g}{:>14.6g}{:>14.6g}  {}\n", kChannels[c], each.largest, each.mean,
                    each.rootMeanSquare,
                    each.largest > 0.0 ? colourText(each.at.data_block()) : "-");
     }
 }
 
-void printJson(const Differences& differences, bool isWithin) {
+void printJson(const ol::Differences& differences, bool isWithin) {
     const auto number = [](double value) {
         return std::isfinite(value) ? fmt::format("{}", value) : std::string("\"inf\"");
     };
     fmt::print("{{\"within_tolerance\": {}", isWithin);
     for (unsigned c = 0; c < 3; ++c) {
-        const Difference& each = differences[c];
+        const ol::Difference& each = differences[c];
         fmt::print(",\n \"{}\": {{\"largest\": {}, \"at\": {}, \"mean\": {}, \"rms\": {}}}",
                    kChannels[c], number(each.largest), jsonTriple(each.at.data_block()),
                    number(each.mean), number(each.rootMeanSquare));
@@ -111,7 +111,7 @@ int runDiff(const DiffOptions& options) {
     }
     const Table a = readWholeTable(options.a, readingOf(options.a, options.reading));
     const Table b = readWholeTable(options.b, readingOf(options.b, options.reading));
-    const Differences differences =
+    const ol::Differences differences =
         options.reading.isStrict ? compareSamples(a, b) : compareLooks(a, b, options.colours);
     const bool isWithin = largestOf(differences) <= options.tolerance;
     if (options.isJson) {

@@ -5,11 +5,11 @@
 #include <optional>
 #include <string>
 
+#include "lut/evaluation/Look.h"
 #include "orlith/Command.h"
 #include "orlith/Json.h"
 #include "orlith/Messages.h"
 #include "orlith/table/Facts.h"
-#include "orlith/table/Look.h"
 #include "orlith/table/TableFile.h"
 
 namespace orlith {
@@ -113,7 +113,7 @@ void printShaper(const char* name, const ol::Shaper& shaper) {
 
 void printText(const Table& table, const InfoOptions& options) {
     const ol::LUT& lut = *table.lut;
-    const Domain domain = domainOf(lut);
+    const ol::Range domain = inputRangeOf(lut);
     const auto line = [](const char* name, const std::string& value) {
         fmt::print("{:<16}{}\n", name, value);
     };

@@ -3,8 +3,8 @@
 #include <cmath>
 #include <limits>
 
+#include "lut/evaluation/Look.h"
 #include "lut/io/Lattice.h"
-#include "orlith/table/Look.h"
 
 namespace orlith {
 namespace {

@@ -12,6 +12,7 @@
 #include <system_error>
 
 #include "lut/Exception.h"
+#include "lut/evaluation/Range.h"
 #include "lut/io/Registry.h"
 #include "orlith/Command.h"
 #include "orlith/Messages.h"
@@ -146,13 +147,6 @@ std::string formatProblem(const char* message, const std::string& extension, con
         text.replace(place, 2, extension);
     }
     return fmt::format("{} (name the format by {})", text, option);
-}
-
-std::uint64_t pointCount(const ol::LUT& lut) {
-    const auto width = static_cast<std::uint64_t>(lut.width());
-    if (lut.is1D()) return width;
-    return width * static_cast<std::uint64_t>(lut.height()) *
-           static_cast<std::uint64_t>(lut.depth());
 }
 
 std::string sizeText(const ol::LUT& lut) {

@@ -51,9 +51,6 @@ Table readTableAndWarn(const std::string& path, const ReadOptions& options);
 /// Likewise, but fewer samples are a failure: what is missing is no black.
 Table readWholeTable(const std::string& path, const ReadOptions& options);
 
-/// Points of a table.
-std::uint64_t pointCount(const Orlith::LUT::LUT& lut);
-
 /// Size as people write it: "33 x 33 x 33 points", or "1024 entries".
 std::string sizeText(const Orlith::LUT::LUT& lut);
 

@@ -6,6 +6,8 @@
 #include <cmath>
 #include <optional>
 
+#include "lut/evaluation/Range.h"
+#include "lut/io/BLUTLayout.h"
 #include "orlith/Command.h"
 #include "orlith/Messages.h"
 #include "orlith/table/TableFile.h"
@@ -14,8 +16,6 @@ namespace orlith {
 namespace {
 
 namespace ol = Orlith::LUT;
-
-constexpr int kWidestBLUT = 127;  // its size byte is read as a signed number
 
 /// Half a unit of the sixth digit, and the roundings of a float on its way through text.
 double textTolerance(double value) {
@@ -96,8 +96,9 @@ Table readBack(const std::string& path, const ReadOptions& options, const std::s
 }  // namespace
 
 std::string whyUnreadable(const std::string& extension, const ol::LUT& table) {
-    if (extension != ".blut" || table.width() <= kWidestBLUT) return "";
-    return fmt::format("a .blut file of more than {} points a side cannot be read", kWidestBLUT);
+    if (extension != ".blut" || table.width() <= ol::kBLUTMostPoints) return "";
+    return fmt::format("a .blut file of more than {} points a side cannot be read",
+                       ol::kBLUTMostPoints);
 }
 
 std::string clippingText(const ol::LUT& lut, const std::string& extension,

@@ -13,8 +13,6 @@
 namespace Orlith::LUT {
 namespace {
 
-constexpr int kBLUTMostPoints = 127;  // the size is a signed byte
-
 [[noreturn]] void fail(const Reading& reading, const std::string& reason) {
     reading.remarks.addLast(0, reason);
     throw Exception("BLUT LUT reader: syntax error while reading LUT data.");
@@ -61,7 +59,7 @@ void finishBLUT(const Reading& reading, const BLUTHeaderBytes& header, LUT& lut)
         if (reading.sampleCount < points) fail(reading, endsEarly(reading.sampleCount, points));
         if (!rises(range)) fail(reading, "the range in the header does not rise");
         const int size = lut.width();
-        setDomain(lut, range.min, range.max, {size, size, size});
+        setDomain(lut, range, {size, size, size});
         return;
     }
     if (reading.sampleCount < points) {
@@ -78,7 +76,8 @@ Range rangeOfBLUT(const LUT& lut) {
     if (lut.width() > kBLUTMostPoints) {
         throw Exception("unable to write: the format has no place for more than 127 points a side");
     }
-    return coversUnit(lut) ? Range{{0, 0, 0}, {1, 1, 1}} : domainOf(lut);
+    const Range domain = domainOf(lut);
+    return isUnit(domain) ? unitRange() : domain;
 }
 
 }  // namespace Orlith::LUT

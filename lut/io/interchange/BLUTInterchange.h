@@ -2,9 +2,9 @@
 
 #include <cstddef>
 
+#include "lut/evaluation/Range.h"
 #include "lut/io/BLUTLayout.h"
 #include "lut/io/LUTFileReader.h"
-#include "lut/io/interchange/Range.h"
 
 namespace Orlith::LUT {
 

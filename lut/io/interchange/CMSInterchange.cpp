@@ -46,7 +46,7 @@ void CMSInterchange::finish(LUT& lut, LineSource& lines) {
         }
         return;
     }
-    setDomain(lut, range_->min, range_->max, {latticeSize_, latticeSize_, latticeSize_});
+    setDomain(lut, *range_, {latticeSize_, latticeSize_, latticeSize_});
 }
 
 void CMSInterchange::watch(std::string_view line) {

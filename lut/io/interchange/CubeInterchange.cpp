@@ -76,7 +76,7 @@ void CubeInterchange::finish(LUT& lut, LineSource& lines) {
     if (domain) {
         expectRising(*domain);
         const int size = lut.width();
-        setDomain(lut, domain->min, domain->max, {size, size, size});
+        setDomain(lut, *domain, {size, size, size});
     }
     if (!hasShaper) return;
     if (curveRange_ && !isUnit(*curveRange_)) {

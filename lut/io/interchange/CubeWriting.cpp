@@ -1,6 +1,6 @@
 #include "lut/io/interchange/CubeWriting.h"
 
-#include "lut/io/interchange/Range.h"
+#include "lut/evaluation/Range.h"
 #include "lut/io/interchange/WriteChecks.h"
 
 namespace Orlith::LUT {
@@ -11,8 +11,8 @@ void expectHeldByCube(const LUT& lut) {
 }
 
 void writeCubeDomain(LineWriter& file, const LUT& lut) {
-    if (coversUnit(lut)) return;
     const Range domain = domainOf(lut);
+    if (isUnit(domain)) return;
     file.text("DOMAIN_MIN ").shortestTriple(domain.min.data_block()).endLine();
     file.text("DOMAIN_MAX ").shortestTriple(domain.max.data_block()).endLine();
 }

@@ -63,6 +63,11 @@ std::string quoted(std::string_view word) {
     return text + (word.size() > kMost ? "...\"" : "\"");
 }
 
+std::string endsEarly(std::uint64_t sampleCount, std::uint64_t points) {
+    return "the file ends after " + std::to_string(sampleCount) + " of " + std::to_string(points) +
+           " samples";
+}
+
 bool TextInterchange::pass(std::string_view& line) {
     if (isOver_) return false;
     constexpr std::size_t kMostKept = 200;

@@ -6,8 +6,8 @@
 
 #include "lut/Exception.h"
 #include "lut/LUT.h"
+#include "lut/evaluation/Range.h"
 #include "lut/io/LUTFileReader.h"
-#include "lut/io/interchange/Range.h"
 #include "lut/io/text/LineSource.h"
 
 namespace Orlith::LUT {
@@ -138,5 +138,8 @@ private:
 /// A word as people want to see it: in quotation marks, cut if it is long, control characters as
 /// "\r" and the like.
 std::string quoted(std::string_view word);
+
+/// "the file ends after 1 of 8 samples"
+std::string endsEarly(std::uint64_t sampleCount, std::uint64_t points);
 
 }  // namespace Orlith::LUT

@@ -4,8 +4,8 @@
 #include <cstddef>
 
 #include "lut/Exception.h"
+#include "lut/evaluation/Range.h"
 #include "lut/io/Lattice.h"
-#include "lut/io/interchange/Range.h"
 
 namespace Orlith::LUT {
 
@@ -40,7 +40,7 @@ void expectNoPreLUT(const LUT& lut) {
 }
 
 void expectUnitDomain(const LUT& lut) {
-    if (!coversUnit(lut)) {
+    if (!isUnit(domainOf(lut))) {
         throw Exception("unable to write: the format has no place for a domain but 0 to 1");
     }
 }

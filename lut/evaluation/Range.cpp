@@ -1,8 +1,13 @@
-#include "lut/io/interchange/Range.h"
+#include "lut/evaluation/Range.h"
 
+#include <algorithm>
 #include <cmath>
 
 namespace Orlith::LUT {
+
+Range unitRange() {
+    return {RGB(0.0F, 0.0F, 0.0F), RGB(1.0F, 1.0F, 1.0F)};
+}
 
 bool rises(const Range& range) {
     for (unsigned c = 0; c < 3; ++c) {
@@ -14,7 +19,21 @@ bool rises(const Range& range) {
 }
 
 bool isUnit(const Range& range) {
-    return range.min == RGB(0.0F, 0.0F, 0.0F) && range.max == RGB(1.0F, 1.0F, 1.0F);
+    // 1 / (N - 1), times N - 1, may miss 1 by two units in its last place.
+    constexpr float kLastBits = 2.5e-7F;
+    for (unsigned c = 0; c < 3; ++c) {
+        if (range.min[c] != 0.0F || !(std::fabs(range.max[c] - 1.0F) <= kLastBits)) return false;
+    }
+    return true;
+}
+
+Range intersection(const Range& a, const Range& b) {
+    Range both;
+    for (unsigned c = 0; c < 3; ++c) {
+        both.min[c] = std::max(a.min[c], b.min[c]);
+        both.max[c] = std::min(a.max[c], b.max[c]);
+    }
+    return both;
 }
 
 Range domainOf(const LUT& lut) {
@@ -23,21 +42,12 @@ Range domainOf(const LUT& lut) {
     return range;
 }
 
-void setDomain(LUT& lut, const RGB& min, const RGB& max, const int (&points)[3]) {
+void setDomain(LUT& lut, const Range& domain, const int (&points)[3]) {
     lut.transform.set_identity();
     for (unsigned c = 0; c < 3; ++c) {
-        lut.transform[c][c] = (max[c] - min[c]) / static_cast<float>(points[c] - 1);
-        lut.transform[3][c] = min[c];
+        lut.transform[c][c] = (domain.max[c] - domain.min[c]) / static_cast<float>(points[c] - 1);
+        lut.transform[3][c] = domain.min[c];
     }
-}
-
-bool coversUnit(const LUT& lut) {
-    constexpr float kLastBits = 2.5e-7F;  // two units in the last place of 1
-    const Range range = domainOf(lut);
-    for (unsigned c = 0; c < 3; ++c) {
-        if (range.min[c] != 0.0F || !(std::fabs(range.max[c] - 1.0F) <= kLastBits)) return false;
-    }
-    return true;
 }
 
 std::uint64_t pointCount(const LUT& lut) {
@@ -45,11 +55,6 @@ std::uint64_t pointCount(const LUT& lut) {
     return lut.is1D() ? width
                       : width * static_cast<std::uint64_t>(lut.height()) *
                             static_cast<std::uint64_t>(lut.depth());
-}
-
-std::string endsEarly(std::uint64_t sampleCount, std::uint64_t points) {
-    return "the file ends after " + std::to_string(sampleCount) + " of " + std::to_string(points) +
-           " samples";
 }
 
 }  // namespace Orlith::LUT

@@ -1,4 +1,4 @@
-#include "orlith/table/Look.h"
+#include "lut/evaluation/Look.h"
 
 #include <algorithm>
 #include <cmath>
@@ -6,21 +6,18 @@
 #include <limits>
 #include <random>
 
-namespace orlith {
+namespace Orlith::LUT {
 namespace {
-
-namespace ol = Orlith::LUT;
 
 constexpr std::size_t kBlockColours = 4096;
 
 /// The input at a position from 0 to 1 along a table's pre-LUT or points.
-float inputAt(const ol::LUT& lut, const Domain& domain, unsigned channel, double position) {
+float inputAt(const LUT& lut, const Range& range, unsigned channel, double position) {
     const auto& entries = lut.inputShaper.entries;
     const double last = static_cast<double>(lut.inputShaper.counts[channel]) - 1.0;
     if (entries.empty() || !(last >= 1.0)) {
-        const auto min = static_cast<double>(domain.min[channel]);
-        return static_cast<float>(min +
-                                  position * (static_cast<double>(domain.max[channel]) - min));
+        const auto min = static_cast<double>(range.min[channel]);
+        return static_cast<float>(min + position * (static_cast<double>(range.max[channel]) - min));
     }
     const double place = position * last;
     const std::size_t below = std::min(static_cast<std::size_t>(place), entries.size() - 1);
@@ -32,34 +29,20 @@ float inputAt(const ol::LUT& lut, const Domain& domain, unsigned channel, double
 
 }  // namespace
 
-Domain domainOf(const ol::LUT& lut) {
-    Domain domain;
-    lut.minmax(domain.min, domain.max);
+Range inputRangeOf(const LUT& lut) {
     const auto& entries = lut.inputShaper.entries;
-    if (!entries.empty()) {
-        for (unsigned c = 0; c < 3; ++c) {
-            const auto count = static_cast<std::size_t>(std::max(lut.inputShaper.counts[c], 1.0F));
-            domain.min[c] = entries.front()[c];
-            domain.max[c] = entries[std::min(count, entries.size()) - 1][c];
-        }
-    } else if (!lut.outputShaper.empty()) {
-        domain.min.fill(0.0F);
-        domain.max.fill(1.0F);
-    }
-    return domain;
-}
-
-Domain intersection(const Domain& a, const Domain& b) {
-    Domain both;
+    if (entries.empty()) return lut.outputShaper.empty() ? domainOf(lut) : unitRange();
+    Range range;
     for (unsigned c = 0; c < 3; ++c) {
-        both.min[c] = std::max(a.min[c], b.min[c]);
-        both.max[c] = std::min(a.max[c], b.max[c]);
+        const auto count = static_cast<std::size_t>(std::max(lut.inputShaper.counts[c], 1.0F));
+        range.min[c] = entries.front()[c];
+        range.max[c] = entries[std::min(count, entries.size()) - 1][c];
     }
-    return both;
+    return range;
 }
 
-void forEachInput(const ol::LUT& lut, bool withHalfWays, const UseColour& use) {
-    const Domain domain = domainOf(lut);
+void forEachInput(const LUT& lut, bool withHalfWays, const UseColour& use) {
+    const Range range = inputRangeOf(lut);
     const int steps = withHalfWays ? 2 : 1;
     const int sides[] = {lut.width(), lut.is1D() ? 1 : lut.height(), lut.is1D() ? 1 : lut.depth()};
     std::vector<float> inputs[3];
@@ -67,31 +50,30 @@ void forEachInput(const ol::LUT& lut, bool withHalfWays, const UseColour& use) {
         const int cells = (lut.is1D() ? sides[0] : sides[c]) - 1;
         for (int i = 0; i <= cells * steps; ++i) {
             const double position = cells == 0 ? 0.0 : static_cast<double>(i) / (cells * steps);
-            inputs[c].push_back(inputAt(lut, domain, c, position));
+            inputs[c].push_back(inputAt(lut, range, c, position));
         }
     }
     if (lut.is1D()) {
         for (std::size_t i = 0; i < inputs[0].size(); ++i)
-            use(ol::RGB(inputs[0][i], inputs[1][i], inputs[2][i]));
+            use(RGB(inputs[0][i], inputs[1][i], inputs[2][i]));
         return;
     }
     for (const float b : inputs[2]) {
         for (const float g : inputs[1]) {
             for (const float r : inputs[0])
-                use(ol::RGB(r, g, b));
+                use(RGB(r, g, b));
         }
     }
 }
 
-void forEachRandom(const Domain& domain, int count, const UseColour& use) {
+void forEachRandom(const Range& range, int count, const UseColour& use) {
     std::mt19937 random(1);
     for (int i = 0; i < count; ++i) {
-        ol::RGB colour;
+        RGB colour;
         for (unsigned c = 0; c < 3; ++c) {
             const double share = static_cast<double>(random()) / 4294967295.0;  // of 32 bits
-            const auto min = static_cast<double>(domain.min[c]);
-            colour[c] =
-                static_cast<float>(min + share * (static_cast<double>(domain.max[c]) - min));
+            const auto min = static_cast<double>(range.min[c]);
+            colour[c] = static_cast<float>(min + share * (static_cast<double>(range.max[c]) - min));
         }
         use(colour);
     }
@@ -101,7 +83,7 @@ double largestOf(const Differences& differences) {
     return std::max({differences[0].largest, differences[1].largest, differences[2].largest});
 }
 
-void addDifference(Difference& difference, float a, float b, const ol::RGB& at) {
+void addDifference(Difference& difference, float a, float b, const RGB& at) {
     if (a == b || (std::isnan(a) && std::isnan(b))) return;
     double distance = std::fabs(static_cast<double>(a) - static_cast<double>(b));
     if (std::isnan(distance)) distance = std::numeric_limits<double>::infinity();
@@ -121,11 +103,11 @@ void finishDifferences(Differences& differences, std::uint64_t count) {
     }
 }
 
-LookComparison::LookComparison(const ol::Evaluator& a, const ol::Evaluator& b) : a_(a), b_(b) {
+LookComparison::LookComparison(const Evaluator& a, const Evaluator& b) : a_(a), b_(b) {
     colours_.reserve(3 * kBlockColours);
 }
 
-void LookComparison::add(const ol::RGB& colour) {
+void LookComparison::add(const RGB& colour) {
     colours_.insert(colours_.end(), {colour[0], colour[1], colour[2]});
     if (colours_.size() == 3 * kBlockColours) flush();
 }
@@ -138,7 +120,7 @@ void LookComparison::flush() {
     for (std::size_t i = 0; i < colours_.size(); ++i) {
         const float* const colour = colours_.data() + i / 3 * 3;
         addDifference(differences_[i % 3], resultsA_[i], resultsB_[i],
-                      ol::RGB(colour[0], colour[1], colour[2]));
+                      RGB(colour[0], colour[1], colour[2]));
     }
     count_ += colours_.size() / 3;
     colours_.clear();
@@ -150,4 +132,4 @@ Differences LookComparison::finish() {
     return differences_;
 }
 
-}  // namespace orlith
+}  // namespace Orlith::LUT

@@ -5,11 +5,12 @@
 
 #include "lut/LUT.h"
 
-namespace orlith {
+namespace Orlith::LUT {
 
 /// Why the files of a format cannot hold a table with its look as it is, such as "a shaper"; empty
 /// if they can.
-std::string whyNotHeld(const Orlith::LUT::LUT& lut, const std::string& extension);
+/// @throws std::invalid_argument  nothing is written as that
+std::string whyNotHeld(const LUT& lut, const std::string& extension);
 
 /// Whether the files of a format have a place for a pre-LUT that is the operator's: a ramp in front
 /// of the lattice.
@@ -17,9 +18,9 @@ bool takesRamp(const std::string& extension);
 
 /// A table as a format holds it.
 struct Fitted {
-    boost::shared_ptr<Orlith::LUT::LUT> lut;
+    boost::shared_ptr<LUT> lut;
     std::string whyResampled;  ///< empty: the table as it is
-    std::string domainChange;  ///< "from 0 0 0 to 4 4 4, to 0 0 0 to 1 1 1"; empty: it is kept
+    bool losesInputs;          ///< its domain is smaller than the table's
 };
 
 /// Makes a table that a format's writer, as other programs mean the format, holds with its look:
@@ -27,7 +28,7 @@ struct Fitted {
 ///
 /// @param size       points a side wanted; 0: the table's own, or 33 where a curve becomes a
 ///                   lattice
-/// @throws Failure   no table of that size
-Fitted fit(const boost::shared_ptr<Orlith::LUT::LUT>& lut, const std::string& extension, int size);
+/// @throws std::invalid_argument  the format has no tables of that size; the text says so
+Fitted fit(const boost::shared_ptr<LUT>& lut, const std::string& extension, int size);
 
-}  // namespace orlith
+}  // namespace Orlith::LUT

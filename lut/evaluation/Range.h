@@ -1,7 +1,6 @@
 #pragma once
 
 #include <cstdint>
-#include <string>
 
 #include "lut/LUT.h"
 
@@ -13,25 +12,26 @@ struct Range {
     RGB max;
 };
 
+/// 0 to 1 on every channel.
+Range unitRange();
+
 /// Whether a range can be a domain: finite, and every channel rises.
 bool rises(const Range& range);
 
-/// Whether a range is 0 to 1.
+/// Whether a range is 0 to 1, but for the last bits that a transform's rounding takes.
 bool isUnit(const Range& range);
 
+/// What both have; max is below min where that is nothing.
+Range intersection(const Range& a, const Range& b);
+
+/// The inputs of a table's first and last points, as its transform says.
 Range domainOf(const LUT& lut);
 
-/// Gives each channel of a table the domain from min to max.
+/// Gives each channel of a table a domain.
 /// @param points  along each channel
-void setDomain(LUT& lut, const RGB& min, const RGB& max, const int (&points)[3]);
-
-/// Whether a table covers 0 to 1, as its transform says, but for the last bits of it.
-bool coversUnit(const LUT& lut);
+void setDomain(LUT& lut, const Range& domain, const int (&points)[3]);
 
 /// Points of a lattice, entries of a curve.
 std::uint64_t pointCount(const LUT& lut);
-
-/// "the file ends after 1 of 8 samples"
-std::string endsEarly(std::uint64_t sampleCount, std::uint64_t points);
 
 }  // namespace Orlith::LUT
