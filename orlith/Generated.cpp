@@ -71,9 +71,9 @@ void warnOfOtherLook(const Generated& file, const std::string& extension,
             : fmt::format("generate {0}.cube and make it by \"orlith convert {0}.cube {1}\"", base,
                           file.name);
     warn(fmt::format(
-        "{}: programs that read {} files see a look that is off by {:.2g}: the operator's pre-LUT"
+        "{}: programs that read {} files see a look that is off by {}: the operator's pre-LUT"
         " from 0 to 1 reaches the first cell of the lattice only; {}",
-        file.name, extension, deviation, cure));
+        file.name, extension, deviationText(deviation), cure));
 }
 
 }  // namespace
@@ -97,7 +97,7 @@ std::string reportGenerated(host::Node& node, Orlith::LUT::LUT3D& table, const G
         // The operator has written what it was given, such as samples that are not finite.
         warn(fmt::format("{} (as other programs read it)", failure.what()));
     }
-    return summary(file.name, extension, table, fmt::format("largest deviation {:.2g}", deviation));
+    return summary(file.name, extension, table, "largest deviation " + deviationText(deviation));
 }
 
 }  // namespace orlith

@@ -50,7 +50,16 @@ bool parseInteger(std::string_view word, int& number) {
 }
 
 bool parseReal(std::string_view word, double& number) {
+    if (word.substr(0, 2) == " -") word.remove_prefix(1);
     return parseWhole(word, number);
+}
+
+std::string markedNegative(const std::string& word) {
+    // The parser knows numbers by their digit.
+    const bool looksLikeOption =
+        word.size() > 1 && word[0] == '-' && (word[1] < '0' || word[1] > '9');
+    double ignored = 0.0;
+    return looksLikeOption && parseReal(word, ignored) ? " " + word : word;
 }
 
 CLI::Option* addInteger(CLI::App& command, const std::string& name, int least, int most,

@@ -13,8 +13,12 @@ namespace orlith {
 /// @return false, leaving the number alone, if it is none or does not fit
 bool parseInteger(std::string_view word, int& number);
 
-/// Likewise; "nan" and "inf" are numbers here.
+/// Likewise; "nan" and "inf" are numbers here, and one that is markedNegative.
 bool parseReal(std::string_view word, double& number);
+
+/// A word of the command line as it is, but for negative numbers that begin as short options do:
+/// a blank in front of "-inf" or "-.5" tells them apart.
+std::string markedNegative(const std::string& word);
 
 /// Adds an option that takes an integer within a range.
 CLI::Option* addInteger(CLI::App& command, const std::string& name, int least, int most,

@@ -15,7 +15,7 @@ namespace orlith {
 ///     output.deliver();                          looks/film.cube
 ///
 /// A pipe or a device gets the finished file's bytes instead. While an OutputFile lives, Ctrl-C is
-/// a request (see CancelScope). Links are followed; the file at their end is replaced, and its
+/// a request (see CancelScope), unless interruptAtOnce. Links are followed; the file at their end is replaced, and its
 /// permissions are kept.
 class OutputFile {
 public:
@@ -48,6 +48,10 @@ public:
 
     /// @throws Cancelled
     void expectNotCancelled() const;
+
+    /// From here on Ctrl-C ends the program at once, which removes what is unfinished: for work
+    /// that would not ask.
+    void interruptAtOnce() { scope_.release(); }
 
     /// Puts the finished file in place. From here on Ctrl-C does not count any more.
     /// @throws Cancelled, Failure  and what stood there before still does

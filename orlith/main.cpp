@@ -7,6 +7,7 @@
 #include <cstdio>
 #include <new>
 #include <system_error>
+#include <utility>
 
 #include "host/Host.h"
 #include "lut/Exception.h"
@@ -96,7 +97,10 @@ int failToPrint(int error) {
 int run(CLI::App& program, int argc, char** argv, const int& status) {
     try {
         expectKnown(program, argc > 1 ? argv[1] : "--help");
-        program.parse(argc, argv);
+        std::vector<std::string> words;  // the last one first, as the parser wants them
+        for (int i = argc - 1; i > 0; --i)
+            words.push_back(markedNegative(argv[i]));
+        program.parse(std::move(words));
         return status;
     } catch (const CLI::Success& request) {  // --help, --version
         return program.exit(request);

@@ -224,12 +224,18 @@ int usualBitsFor(float code) {
 
 /// A dim look is taken for a bright one if its largest code fits fewer bits than it was made for. A
 /// look that reaches the largest code of its bits leaves no doubt.
-void remarkGuess(int bits, float largest, Remarks& remarks) {
+/// @param bits      that hold the largest code, or 0
+/// @param usedBits  the depth in place of such bits
+void remarkGuess(int bits, int usedBits, float largest, Remarks& remarks) {
     const int code = toInt32(std::nearbyint(largest));
-    if (bits == 0 || code == codeMaxOf(bits)) return;
+    if (bits != 0 && code == codeMaxOf(bits)) return;
+    const char* const why = bits != 0
+                                ? " bits are taken, which hold the largest code, "
+                                : " bits are taken, as in the input grid; no usual depth holds the "
+                                  "largest code, ";
     remarks.add("depth", 0,
-                "the output bit depth is not stated: " + std::to_string(bits) +
-                    " bits are taken, which hold the largest code, " + std::to_string(code));
+                "the output bit depth is not stated: " +
+                    std::to_string(bits != 0 ? bits : usedBits) + why + std::to_string(code));
 }
 
 /// What the samples have still to be multiplied by, now that the largest code is known.
@@ -238,7 +244,7 @@ float laterFactor(const Request& request, const Header3DL& header, const Grid3DL
                   int usedBits, float outputMax, float largest, Remarks& remarks) {
     if (header.lacksOutputBits() && grid.inputBits != 0) {
         const int bits = usualBitsFor(largest);
-        remarkGuess(bits, largest, remarks);
+        remarkGuess(bits, usedBits, largest, remarks);
         if (bits == 0 || bits == usedBits) return 1.0F;
         return outputMax / static_cast<float>(codeMaxOf(bits));
     }

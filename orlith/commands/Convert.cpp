@@ -140,7 +140,7 @@ std::string compareLooks(const OutputFile& output, const std::string& extension,
     const Table back =
         readTable(output.stagedPath(), readingOf(extension, options3DL), output.name());
     const double deviation = lookDeviation(source, back.lut);
-    std::string words = fmt::format("largest deviation {:.2g}", deviation);
+    std::string words = "largest deviation " + deviationText(deviation);
     std::vector<std::string> causes;
     if (!fitted.whyResampled.empty()) causes.push_back("resampled for " + fitted.whyResampled);
     if (fitted.whyResampled == "a shaper") causes.emplace_back("a .csp file keeps it");
@@ -151,8 +151,8 @@ std::string compareLooks(const OutputFile& output, const std::string& extension,
     if (!isPrecise && causes.empty()) {
         // A steep shaper or a tiny domain takes more digits than a line of text has.
         if (ol::whyNotHeld(*fitted.lut, ".vf").empty()) {
-            throw Failure(
-                fmt::format("{}: read back, its look is off by {:.2g}", output.name(), deviation));
+            throw Failure(fmt::format("{}: read back, its look is off by {}", output.name(),
+                                      deviationText(deviation)));
         }
         causes.emplace_back("the format's digits");
     }
@@ -207,6 +207,7 @@ int runConvert(const ConvertOptions& options) {
     const std::string clipping = clippingText(*fitted.lut, extension, options3DL);
 
     OutputFile output(options.output);
+    output.interruptAtOnce();
     writeTable(*writer, output, extension, fitted.lut);
     if (fitted.losesInputs) {
         warn(fmt::format("{}: its domain changes from {}, to {}", output.name(),
@@ -218,9 +219,9 @@ int runConvert(const ConvertOptions& options) {
     if (!words.empty()) {
         words = "not verified: " + words;
     } else {
-        words = fmt::format("largest deviation {:.2g}",
-                            verify(output.stagedPath(), output.name(), extension, *fitted.lut,
-                                   options3DL, isByBook));
+        words = "largest deviation " +
+                deviationText(verify(output.stagedPath(), output.name(), extension, *fitted.lut,
+                                     options3DL, isByBook));
         if (!options.reading.isStrict) {
             words =
                 compareLooks(output, extension, options, options3DL, table.lut, fitted, clipping);

@@ -52,7 +52,7 @@ int runPanel(const Knobs& knobs) {
                 break;
             default:
                 fmt::print("  {:<26}{:<20}{}\n", control->label(), control->name(),
-                           valueText(*control));
+                           printable(valueText(*control)));
         }
     }
     return kDone;

@@ -10,6 +10,7 @@
 #include "lut/io/BLUTLayout.h"
 #include "orlith/Command.h"
 #include "orlith/Messages.h"
+#include "orlith/Options.h"
 #include "orlith/table/TableFile.h"
 
 namespace orlith {
@@ -156,6 +157,18 @@ double verify(const std::string& path, const std::string& name, const std::strin
     }
     if (isByBook) verifyPreLUT(name, extension, *back.lut, table);
     return largest;
+}
+
+std::string deviationText(double deviation) {
+    const std::string nearest = fmt::format("{:.1e}", deviation);  // "5.4e-07"
+    double shown = 0.0;
+    parseReal(nearest, shown);
+    if (shown < deviation) {
+        double unit = 0.0;  // of the first digit
+        parseReal("1" + nearest.substr(nearest.find('e')), unit);
+        shown += 0.1 * unit;
+    }
+    return fmt::format("{:.2g}", shown);
 }
 
 std::string summary(const std::string& name, const std::string& extension, const ol::LUT& table,

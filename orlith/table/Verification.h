@@ -33,6 +33,9 @@ ReadOptions readingOf(const std::string& extension, const Options3DL& options);
 double verify(const std::string& path, const std::string& name, const std::string& extension,
               const Orlith::LUT::LUT& table, const Options3DL& options, bool isByBook = true);
 
+/// A deviation in two digits, rounded up: what is told is never below what is lost.
+std::string deviationText(double deviation);
+
 /// The line that says what was written.
 /// @param outcome  of its verification
 std::string summary(const std::string& name, const std::string& extension,

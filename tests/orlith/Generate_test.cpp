@@ -41,10 +41,10 @@ TEST_F(GenerateTest, RecordsALookInEveryFormat) {
          OTHER_LOOK(".cub", "0.94", "--lut1d 0 leaves it away"), "0.375 0.25 0.25"},
         {"o.cub --lut1d 0", "0", "", "0.375 0.25 0.25"},
         {"o.3dl", "0.00049", SIZE_WARNING, "0.37536657 0.25024438 0.25024438"},
-        {"o.3dl --format-3dl lustre --output-bitdepth 12", "0.00012", SIZE_WARNING,
+        {"o.3dl --format-3dl lustre --output-bitdepth 12", "0.00013", SIZE_WARNING,
          "0.37509158 0.25006106 0.25006106"},
-        {"o.3dl --knob bitdepth_id=4", "7.6e-06", SIZE_WARNING, "0.37500572 0.2500038 0.2500038"},
-        {"o.3dl --format-3dl scratch --bitdepth 16", "7.3e-06",
+        {"o.3dl --knob bitdepth_id=4", "7.7e-06", SIZE_WARNING, "0.37500572 0.2500038 0.2500038"},
+        {"o.3dl --format-3dl scratch --bitdepth 16", "7.4e-06",
          "Warning: SCRATCH prefers 3DL files of 32x32x32\n", "0.3749977 0.25000367 0.25000367"},
     };
     for (const auto& each : kCases) {

@@ -113,6 +113,8 @@ TEST_F(InspectTest, EvalSendsColoursThroughATable) {
          "orlith: error: --mode tetrahedral does not go with --strict\n"},
         {"eval a.cube 1e-60 +1 1e60", 0, "1 0 0.25\n", ""},
         {"eval a.cube 1e-60 +1 1e60 --strict", 0, "nan nan nan\n", ""},
+        {"eval a.cube nan inf -inf", 0, "1 0 0.5\n", ""},
+        {"eval a.cube -.5 1 -nan", 0, "1 0 0.5\n", ""},
         {"eval a.cube 1 1 0x1", 2, "", "orlith: error: \"0x1\" is not a number\n"},
     });
     EXPECT_EQ(output("eval - 0.25 0.5 0.5 --from .CUBE", kLattice), "0.5 0.25 0.375\n");

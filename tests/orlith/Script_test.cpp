@@ -17,7 +17,7 @@ TEST_F(ScriptTest, RunLoadsNodesAndPressesButtons) {
     EXPECT_FALSE(exists("first.cube"));
     expect("run saved.tcl --press first.generate --press GenerateLUT1.generate", 0,
            "first.cube: .cube, 2 x 2 x 2 points, largest deviation 0\n"
-           "second.3dl: .3dl, 2 x 2 x 2 points, largest deviation 0.00024\n",
+           "second.3dl: .3dl, 2 x 2 x 2 points, largest deviation 0.00025\n",
            "Warning: Flame/Lustre prefers 3DL files of 17x17x17, 33x33x33, 65x65x65\n");
     EXPECT_EQ(output("eval first.cube 1 1 1"), "0.75 1 0\n");
     test::expectIn(read("second.3dl"), "\n3DMESH\n");

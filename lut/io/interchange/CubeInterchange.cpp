@@ -1,6 +1,8 @@
 #include "lut/io/interchange/CubeInterchange.h"
 
+#include <algorithm>
 #include <cstddef>
+#include <string>
 
 #include "lut/io/text/Numbers.h"
 #include "lut/io/text/Tokens.h"
@@ -12,6 +14,17 @@ constexpr char kDataError[] = "Iridas LUT reader: syntax error while reading LUT
 constexpr char kSizeError[] = "Iridas LUT reader: syntax error while reading LUT size.";
 constexpr char kNoTable[] = "Iridas LUT reader: LUT failed to initialise.";
 
+/// Whether a word is one of the format's but for its letters' case.
+bool isKeywordInSmallLetters(std::string_view word) {
+    std::string capitals(word);
+    for (char& c : capitals) {
+        if (c >= 'a' && c <= 'z') c = static_cast<char>(c - 'a' + 'A');
+    }
+    constexpr const char* kKeywords[] = {"LUT_1D_SIZE",        "LUT_3D_SIZE", "LUT_1D_INPUT_RANGE",
+                                         "LUT_3D_INPUT_RANGE", "DOMAIN_MIN",  "DOMAIN_MAX"};
+    return std::find(std::begin(kKeywords), std::end(kKeywords), capitals) != std::end(kKeywords);
+}
+
 }  // namespace
 
 const char* CubeInterchange::dataError() const {
@@ -20,6 +33,13 @@ const char* CubeInterchange::dataError() const {
 
 bool CubeInterchange::wantsPlainTriples() const {
     return isMeant() && latticeSize_ > 0 && shaper_.size() < static_cast<std::size_t>(curveSize_);
+}
+
+template <class Statement>
+void CubeInterchange::take(boost::optional<Statement>& statement, std::string_view keyword,
+                           const Statement& stated) {
+    if (statement) remark("again", quoted(keyword) + " is stated again: this one is used");
+    statement = stated;
 }
 
 bool CubeInterchange::takeKeyword(std::string_view line) {
@@ -35,15 +55,17 @@ bool CubeInterchange::takeKeyword(std::string_view line) {
         return !(isCurve && latticeSize_ > 0);
     }
     if (keyword == "DOMAIN_MIN") {
-        domainMin_ = expectNumbersBehind(line, 3);
+        take(domainMin_, keyword, expectNumbersBehind(line, 3));
     } else if (keyword == "DOMAIN_MAX") {
-        domainMax_ = expectNumbersBehind(line, 3);
+        take(domainMax_, keyword, expectNumbersBehind(line, 3));
     } else if (keyword == "LUT_1D_INPUT_RANGE") {
-        curveRange_ = expectRangeBehind(line);
+        take(curveRange_, keyword, expectRangeBehind(line));
     } else if (keyword == "LUT_3D_INPUT_RANGE") {
-        latticeRange_ = expectRangeBehind(line);
+        take(latticeRange_, keyword, expectRangeBehind(line));
     } else {
-        remark("unknown", quoted(keyword) + " is not known and not used");
+        const char* const why =
+            isKeywordInSmallLetters(keyword) ? ": keywords are in capital letters" : "";
+        remark("unknown", quoted(keyword) + " is not known and not used" + why);
     }
     return false;
 }
@@ -61,10 +83,16 @@ void CubeInterchange::finish(LUT& lut, LineSource& lines) {
     if (!isMeant()) return;
     const bool hasShaper = latticeSize_ > 0 && curveSize_ > 0;
     // The domain of a file is that of its first block.
-    boost::optional<Range>& first = lut.is1D() || hasShaper ? curveRange_ : latticeRange_;
+    const bool isCurveFirst = lut.is1D() || hasShaper;
+    boost::optional<Range>& first = isCurveFirst ? curveRange_ : latticeRange_;
     if (domainMin_ || domainMax_) {
-        first = Range{domainMin_.value_or(RGB(0.0F, 0.0F, 0.0F)),
-                      domainMax_.value_or(RGB(1.0F, 1.0F, 1.0F))};
+        const Range unit = unitRange();
+        const Range stated{domainMin_.value_or(unit.min), domainMax_.value_or(unit.max)};
+        if (first && !(first->min == stated.min && first->max == stated.max)) {
+            const char* const keyword = isCurveFirst ? "LUT_1D_INPUT_RANGE" : "LUT_3D_INPUT_RANGE";
+            remarkAt(0, "range", quoted(keyword) + " is not used: the domain is stated as well");
+        }
+        first = stated;
     }
     if (curveRange_ && curveSize_ == 0) {
         remarkAt(0, "range", "\"LUT_1D_INPUT_RANGE\" is not used: the file has no 1D block");

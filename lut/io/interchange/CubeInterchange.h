@@ -34,6 +34,10 @@ protected:
     std::string reasonOf(std::string_view message, std::string_view lastLine) override;
 
 private:
+    template <class Statement>
+    void take(boost::optional<Statement>& statement, std::string_view keyword,
+              const Statement& stated);
+
     int curveSize_ = 0;  // of the latest size lines; 0: none
     int latticeSize_ = 0;
     boost::optional<RGB> domainMin_;

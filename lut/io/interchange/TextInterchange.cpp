@@ -12,6 +12,7 @@ namespace Orlith::LUT {
 namespace {
 
 constexpr std::string_view kByteOrderMark = "\xef\xbb\xbf";
+constexpr char kReturnsAlone[] = "the lines of the file end in carriage returns alone";
 
 bool isDigit(char c) {
     return c >= '0' && c <= '9';
@@ -170,7 +171,7 @@ void TextInterchange::expectAllSamples(const LUT& lut, LineSource& lines) {
 }
 
 void TextInterchange::fail(const char* message, const std::string& reason) {
-    reading_.remarks.addLast(lineNumber(), reason);
+    reading_.remarks.addLast(lineNumber(), hasReturnsForLineEnds() ? kReturnsAlone : reason);
     isExplained_ = true;
     throw Exception(message);
 }
@@ -184,9 +185,14 @@ std::string TextInterchange::endReason(std::uint64_t points) const {
     return points == 0 ? "the file ends here" : endsEarly(sampleCount(), points);
 }
 
+/// Such a file is one line: as programs wrote it long ago.
+bool TextInterchange::hasReturnsForLineEnds() const {
+    return lineNumber() == 1 && trim(lastLine_).find('\r') != std::string_view::npos;
+}
+
 void TextInterchange::explain(const char* message) {
     if (isExplained_) return;
-    std::string reason = reasonOf(message, lastLine_);
+    std::string reason = hasReturnsForLineEnds() ? kReturnsAlone : reasonOf(message, lastLine_);
     if (reason.empty() && isAtEnd_) reason = endReason();
     if (reason.empty() && lastLineNumber_ != lineNumber()) {
         reason = "what is missing should come before this line of three numbers";

@@ -119,6 +119,7 @@ protected:
 
 private:
     void explain(const char* message);
+    bool hasReturnsForLineEnds() const;
     std::string endReason() const;
     bool passMeant(std::string_view& line);
     void putMarkApart(std::string_view& line);

@@ -35,6 +35,7 @@ public:
             const float number = toFloat(word);
             if (isFirst) first_ = number;
             if (!isFirst && !(number > last_)) rises_ = false;
+            if (!isFirst && !(number >= last_)) falls_ = true;
             isFirst = false;
             last_ = number;
             const std::size_t point = word.find('.');
@@ -48,6 +49,9 @@ public:
     float first() const { return first_; }
     float last() const { return last_; }
     bool rises() const { return rises_; }
+
+    /// Codes of few bits repeat where there are more points: 0 1 2 2 3.
+    bool isEvenInFewBits() const { return isCodes_ && !falls_ && last_ > first_ && isEven(); }
 
     /// Codes, or numbers with a point.
     bool isCodes() const { return isCodes_; }
@@ -87,6 +91,7 @@ private:
     std::string_view line_;
     bool isCodes_;
     bool rises_ = true;
+    bool falls_ = false;  // somewhere
     float first_ = 0.0F;
     float last_ = 0.0F;
     std::size_t count_ = 0;
@@ -184,7 +189,7 @@ void ThreeDLInterchange::hold(std::string_view line, const LineSource& lines) {
 Grid3DL ThreeDLInterchange::gridOf(std::string_view line, const Header3DL& header) {
     const GridLine grid(line);
     if (grid.count() < kFewestPoints) fail(kNoGrid, "an input grid needs at least 2 points");
-    if (!grid.rises()) fail(kNotLinear, "the input grid does not rise");
+    if (!grid.rises() && !grid.isEvenInFewBits()) fail(kNotLinear, "the input grid does not rise");
     const auto pointCount = static_cast<int>(grid.count());  // a line holds fewer words
     const bool isEven = grid.isEven();
     if (!isEven) shaper_ = grid.numbers();

@@ -40,6 +40,18 @@ TEST(CubeInterchange, ReadsFilesAsMeant) {
           ".5 .5 .5 -> .5 .25 .125",
           "2: \"LUT_IN_VIDEO_RANGE\" is not known and not used | 0: \"LUT_1D_INPUT_RANGE\" is not "
           "used: the file has no 1D block"},
+         {"a domain stated twice", "DOMAIN_MAX 4 4 4\nDOMAIN_MAX 2 2 2\n" + kCube, kMeant,
+          "1 1 1 -> .5 .25 .125", "2: \"DOMAIN_MAX\" is stated again: this one is used"},
+         {"a range beside a domain", "LUT_3D_INPUT_RANGE 0 4\nDOMAIN_MAX 2 2 2\n" + kCube, kMeant,
+          "1 1 1 -> .5 .25 .125",
+          "0: \"LUT_3D_INPUT_RANGE\" is not used: the domain is stated as well"},
+         {"the same range beside a domain", "LUT_3D_INPUT_RANGE 0 2\nDOMAIN_MAX 2 2 2\n" + kCube,
+          kMeant, "1 1 1 -> .5 .25 .125"},
+         {"small letters", "lut_3d_size 2\n" + kSamples, kMeant, kNoTable,
+          "1: \"lut_3d_size\" is not known and not used: keywords are in capital letters | "
+          "2: what is missing should come before this line of three numbers"},
+         {"returns alone", "LUT_3D_SIZE 2\r0 0 0\r1 1 1\r", kMeant, kSizeError,
+          "1: the lines of the file end in carriage returns alone"},
          {"a domain by the book", "DOMAIN_MIN 0 0 0\nDOMAIN_MAX 1 2 1\n" + kCube, kBook,
           ".5 .5 .5 -> .5 .25 .125", "2: the domain is not used: the table covers 0 to 1"},
          {"no words", "# nothing\n", kMeant, kNoTable,

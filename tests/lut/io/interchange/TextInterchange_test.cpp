@@ -95,6 +95,9 @@ TEST(TextInterchange, SaysWhyTheBookRefusesWhatIsForgivenAsMeant) {
                                 "1: the file begins with a byte order mark"},
                                {"four words", header + "0 0 0 0\n", kBook, message,
                                 "2: the line has 4 words: \"0 0 0 0\""}});
+    expectOutcomes(".csp", {{"returns alone", "CSPLUTV100\r3D\r", kBook,
+                             "CSP LUT reader: expecting version identifier CSPLUTV100.",
+                             "1: the lines of the file end in carriage returns alone"}});
 }
 
 }  // namespace

@@ -60,6 +60,12 @@ TEST(ThreeDLInterchange, ReadsFilesAsMeant) {
          {"depth guessed", grid + samples(5), kMeant, identity, guess},
          {"largest code of its bits", "0 341 682 1023\n" + samples(4, 15), kMeant,
           leadsTo(0.1F, 0.5F, 0.875F, 1.0F)},
+         {"codes of 17 bits", grid + samples(5, 70000), kMeant,
+          leadsTo(0.1F, 0.5F, 0.875F, 70000.0F / 1023.0F),
+          "0: the output bit depth is not stated: 10 bits are taken, as in the input grid; no "
+          "usual "
+          "depth holds the largest code, 70000"},
+         {"a grid of few bits", lustre + "0 1 2 2 3\n" + samples(5), kMeant, identity},
          {"size of the mesh", lustre + samples(5), kMeant, identity, "3" + even},
          {"size of the header", header + samples(5), kMeant, identity, "5" + even},
          {"size of the samples", "# x\n" + samples(5) + "LUT8\n", kMeant, identity,
