@@ -15,8 +15,8 @@ namespace orlith {
 ///     output.deliver();                          looks/film.cube
 ///
 /// A pipe or a device gets the finished file's bytes instead. While an OutputFile lives, Ctrl-C is
-/// a request (see CancelScope), unless interruptAtOnce. Links are followed; the file at their end is replaced, and its
-/// permissions are kept.
+/// a request (see CancelScope), unless interruptAtOnce. Links are followed; the file at their end
+/// is replaced, and its permissions are kept.
 class OutputFile {
 public:
     /// @param path  "-": standard output

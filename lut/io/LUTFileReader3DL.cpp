@@ -286,10 +286,11 @@ boost::shared_ptr<LUT> LUTFileReader3DL::read(const std::string& filename) {
         const float largest = readLattice(lines, meant, scaling, *lut_, sampleCount_);
         const float factor =
             laterFactor(request, header, grid, outputBits, scaling.outputMax, largest, remarks_);
+        // Before few samples are strewn over the memory of many.
+        meant.finish(*lut_, lines);
         if (factor != 1.0F) multiply(*lut_, sampleCount_, factor);
         placeBlueFastest(*lut_, sampleCount_);
         setDomain(*lut_, grid);
-        meant.finish(*lut_, lines);
         return lut_;
     });
 }

@@ -76,6 +76,9 @@ bool CSPInterchange::isWhole(std::string_view& line) {
     const bool goesOn = !isComment && !line.empty() && line.back() == '\\';
     if (begin_.empty() && !goesOn) return true;
     if (goesOn) line.remove_suffix(1);
+    if (begin_.size() + line.size() >= LineSource::kLongestLine) {
+        fail(dataError(), "a line goes on for more than 16 MiB");
+    }
     begin_.append(line) += ' ';
     if (goesOn) return false;
     whole_.swap(begin_);

@@ -74,7 +74,7 @@ bool CubeInterchange::takeNumbers(std::string_view line) {
     if (!wantsPlainTriples()) return true;
     const Tokens words(line);
     if (words.count() != 3) fail(kDataError, "a line of the 1D block needs three numbers");
-    shaper_.emplace_back(toFloat(words[0]), toFloat(words[1]), toFloat(words[2]));
+    shaper_.push_back(RGB(toFloat(words[0]), toFloat(words[1]), toFloat(words[2])));
     return false;
 }
 
@@ -113,7 +113,7 @@ void CubeInterchange::finish(LUT& lut, LineSource& lines) {
         lut.inputShaper.counts.fill(2.0F);
     }
     lut.outputShaper.counts.fill(static_cast<float>(shaper_.size()));
-    lut.outputShaper.entries = std::move(shaper_);
+    shaper_.moveTo(lut.outputShaper);
 }
 
 void CubeInterchange::watch(std::string_view line) {

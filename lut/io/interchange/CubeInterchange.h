@@ -1,8 +1,8 @@
 #pragma once
 
 #include <boost/optional/optional.hpp>
-#include <vector>
 
+#include "lut/io/ShaperEntries.h"
 #include "lut/io/interchange/TextInterchange.h"
 
 namespace Orlith::LUT {
@@ -44,7 +44,7 @@ private:
     boost::optional<RGB> domainMax_;
     boost::optional<Range> curveRange_;
     boost::optional<Range> latticeRange_;
-    std::vector<RGB> shaper_;  // the 1D block before a lattice
+    ShaperEntries shaper_;  // the 1D block before a lattice
 };
 
 }  // namespace Orlith::LUT

@@ -109,6 +109,7 @@ void TextInterchange::putMarkApart(std::string_view& line) {
 
 void TextInterchange::replaceDecimalCommas(std::string_view& line) {
     rewritten_.clear();
+    rewritten_.reserve(line.size());
     for (std::string_view rest = line, word; takeWord(rest, word);) {
         if (!rewritten_.empty()) rewritten_ += ' ';
         const std::size_t start = rewritten_.size();

@@ -76,6 +76,7 @@ public:
 
     std::vector<float> numbers() const {
         std::vector<float> numbers;
+        numbers.reserve(count_);
         forEachWord([&](std::string_view word) { numbers.push_back(toFloat(word)); });
         return numbers;
     }
@@ -103,7 +104,21 @@ int inputBitsOf(float last) {
     return std::max(1, bitCountOf(toInt32(std::nearbyint(last)) - 1));
 }
 
+constexpr std::size_t kHeldBlock = 131072;  // samples, in pages of their own
+
 }  // namespace
+
+void HeldSamples::add(const RGB& sample) {
+    if (added_ % kHeldBlock == 0) blocks_.emplace_back().resize(kHeldBlock);
+    blocks_.back()[added_++ % kHeldBlock] = sample;
+}
+
+bool HeldSamples::take(RGB& sample) {
+    if (taken_ == added_) return false;
+    sample = blocks_.front()[taken_++ % kHeldBlock];
+    if (taken_ % kHeldBlock == 0) blocks_.pop_front();
+    return true;
+}
 
 const char* ThreeDLInterchange::dataError() const {
     return kDataError;
@@ -150,7 +165,8 @@ Grid3DL ThreeDLInterchange::findGrid(std::string_view line, const Header3DL& hea
         while (lines.next(line))
             hold(line, lines);
         if (held_.size() == kGridAndSamples) {
-            taken_ = 1;
+            RGB grid;
+            held_.take(grid);
             return gridOf(first, header);
         }
         pointCount = countPoints();
@@ -183,7 +199,7 @@ void ThreeDLInterchange::hold(std::string_view line, const LineSource& lines) {
         if (words.count() != 3) throw Exception(kDataError);
         rgb = RGB(toFloat(words[0]), toFloat(words[1]), toFloat(words[2]));
     }
-    held_.push_back(rgb);
+    held_.add(rgb);
 }
 
 Grid3DL ThreeDLInterchange::gridOf(std::string_view line, const Header3DL& header) {
@@ -207,12 +223,6 @@ Grid3DL ThreeDLInterchange::gridOf(std::string_view line, const Header3DL& heade
                "its last one for 1");
     }
     return {pointCount, 0.0F, 1.0F, inputBitsOf(grid.last())};
-}
-
-bool ThreeDLInterchange::takeHeld(RGB& rgb) {
-    if (taken_ == held_.size()) return false;
-    rgb = held_[taken_++];
-    return true;
 }
 
 void ThreeDLInterchange::finish(LUT& lut, LineSource& lines) {

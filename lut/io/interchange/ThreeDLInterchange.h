@@ -1,13 +1,30 @@
 #pragma once
 
 #include <cstddef>
+#include <deque>
 #include <string>
 #include <vector>
 
+#include "lut/SampleArray.h"
 #include "lut/io/Header3DL.h"
 #include "lut/io/interchange/TextInterchange.h"
 
 namespace Orlith::LUT {
+
+/// Samples that wait for their table, first in, first out. Memory goes back as they leave.
+class HeldSamples {
+public:
+    std::size_t size() const { return added_ - taken_; }
+    void add(const RGB& sample);
+
+    /// @return false if there is none
+    bool take(RGB& sample);
+
+private:
+    std::deque<SampleArray> blocks_;
+    std::size_t added_ = 0;
+    std::size_t taken_ = 0;
+};
 
 /// What other programs' .3dl files are, beside their book.
 ///
@@ -35,7 +52,7 @@ public:
 
     /// Takes the next of the samples that findGrid read.
     /// @return false if there is none
-    bool takeHeld(RGB& rgb);
+    bool takeHeld(RGB& rgb) { return held_.take(rgb); }
 
     /// Looks at the table that the reader has made.
     /// @throws Exception  it is not what the file says
@@ -55,8 +72,7 @@ private:
 
     bool isBelowHeader_ = false;
     std::vector<float> shaper_;  // of all channels: the grid, if it is not evenly spaced
-    std::vector<RGB> held_;      // samples
-    std::size_t taken_ = 0;      // of them
+    HeldSamples held_;
 
     // What the reader found, for its failures.
     std::string gridEnds_;
