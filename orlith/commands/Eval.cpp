@@ -1,5 +1,7 @@
 #include <fmt/format.h>
 
+#include <array>
+#include <cstdio>
 #include <functional>
 #include <iostream>
 #include <string>
@@ -32,43 +34,65 @@ bool parseColour(std::string_view word, float& number) {
     return true;
 }
 
-void print(const ol::RGB& colour) {
-    fmt::print("{}\n", colourText(colour.data_block()));
-}
+/// Sends packed colours through the table in place, as its maker means it or by the book.
+using WayThrough = std::function<void(std::vector<float>& colours)>;
 
-/// The way of one colour through the table: as its maker means it, or by the book.
-std::function<ol::RGB(const ol::RGB&)> wayThrough(const Table& table, const EvalOptions& options) {
+WayThrough wayThrough(const Table& table, const EvalOptions& options) {
     const ColourOptions& colours = options.colours;
     if (options.reading.isStrict) {
-        return [lut = table.lut, mode = colours.bookMode(), extrapolates = colours.extrapolates](
-                   const ol::RGB& colour) { return lut->interpolate(colour, mode, extrapolates); };
+        return [lut = table.lut, mode = colours.bookMode(),
+                extrapolates = colours.extrapolates](std::vector<float>& rgb) {
+            for (std::size_t i = 0; i < rgb.size(); i += 3)
+                lut->interpolate(ol::RGB(&rgb[i]), mode, extrapolates).copy_out(&rgb[i]);
+        };
     }
-    return [evaluator = colours.evaluator(table.lut)](const ol::RGB& colour) {
-        ol::RGB result;
-        evaluator.apply(colour.data_block(), result.data_block(), 1);
-        return result;
+    return [evaluator = colours.evaluator(table.lut)](std::vector<float>& rgb) {
+        evaluator.apply(rgb.data(), rgb.data(), rgb.size() / 3);
     };
 }
 
-void evaluateInput(const std::function<ol::RGB(const ol::RGB&)>& way) {
+/// Prints what becomes of the colours, and forgets them.
+void evaluate(const WayThrough& way, std::vector<float>& colours) {
+    way(colours);
+    for (std::size_t i = 0; i < colours.size(); i += 3)
+        fmt::print("{}\n", colourText(&colours[i]));
+    colours.clear();
+}
+
+/// Takes the line's colour, if it has one.
+/// @return false  it has something else
+bool addColour(std::string_view line, std::vector<float>& colours) {
+    const ol::Tokens words(line);
+    if (words.empty()) return true;
+    if (words.count() != 3) return false;
+    std::array<float, 3> colour{};
+    for (unsigned c = 0; c < 3; ++c)
+        if (!parseColour(words[c], colour[c])) return false;
+    colours.insert(colours.end(), colour.begin(), colour.end());
+    return true;
+}
+
+/// Takes colours together as long as more are waiting; whoever waits for an answer gets it at once.
+void evaluateInput(const WayThrough& way) {
+    constexpr std::size_t kMostFloats = 3 * 4096;
+    std::ios::sync_with_stdio(false);  // so that the stream knows what is waiting
+    std::vector<float> colours;
     std::string line;
     for (int number = 1; std::getline(std::cin, line); ++number) {
-        const ol::Tokens words(ol::trim(line));
-        if (words.empty()) continue;
-        ol::RGB colour;
-        bool isColour = words.count() == 3;
-        for (unsigned c = 0; isColour && c < 3; ++c)
-            isColour = parseColour(words[c], colour[c]);
+        const bool isColour = addColour(ol::trim(line), colours);
+        const bool isWaitedFor = std::cin.rdbuf()->in_avail() <= 0;
+        if (!isColour || isWaitedFor || colours.size() >= kMostFloats) evaluate(way, colours);
         if (!isColour) {
             throw Failure(fmt::format("standard input:{}: expected three numbers", number));
         }
-        print(way(colour));
+        if (isWaitedFor) std::fflush(stdout);
     }
+    evaluate(way, colours);
 }
 
 int runEval(const EvalOptions& options) {
-    ol::RGB colour;
-    for (unsigned c = 0; c < options.colour.size(); ++c) {
+    std::vector<float> colour(options.colour.size());
+    for (std::size_t c = 0; c < colour.size(); ++c) {
         if (!parseColour(options.colour[c], colour[c])) {
             throw UsageError(fmt::format("\"{}\" is not a number", options.colour[c]));
         }
@@ -79,10 +103,10 @@ int runEval(const EvalOptions& options) {
     const Table table = options.reading.isStrict ? readTableAndWarn(options.path, options.reading)
                                                  : readWholeTable(options.path, options.reading);
     const auto way = wayThrough(table, options);
-    if (options.colour.empty()) {
+    if (colour.empty()) {
         evaluateInput(way);
     } else {
-        print(way(colour));
+        evaluate(way, colour);
     }
     return kDone;
 }
