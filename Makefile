@@ -57,7 +57,9 @@ ORLITH := $(BUILD)/bin/orlith
 
 demo: build
 	@mkdir -p $(DEMO)
-	$(call say,a 33-point test pattern)
+	$(call say,the look of an image program as a look-up table)
+	$(ORLITH) bake $(DEMO)/baked.cube -- oiiotool {in} --powc 0.45 --mulc 0.9,1,0.8 -o {out}
+	$(call say,the same in steps: a 33-point test pattern)
 	$(ORLITH) pattern $(DEMO)/pattern.exr --size 33
 	$(call say,graded by an image program)
 	oiiotool $(DEMO)/pattern.exr --powc 0.45 --mulc 0.9,1,0.8 -o $(DEMO)/graded.exr

@@ -45,6 +45,9 @@ public:
     /// What was taken where it was not clear, such as: holds 3 parts: took part 0 "rgba"; or empty.
     virtual const std::string& remark() const = 0;
 
+    /// Type of the samples: one of kSampleTypes; empty: another one.
+    virtual std::string sampleType() const = 0;
+
     /// A line of the data window, counted downward from 0: triples red, green, blue, which stand
     /// until the next call. Lines may be asked for in any order; going through them from either end
     /// decodes each part of the file once.

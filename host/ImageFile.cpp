@@ -72,6 +72,7 @@ ImageFile::ImageFile(std::string path, const ImageChoice& choice) : path_(std::m
     expectCredibleSize(source_->frame().data, byteCount_, path_);
     box_ = boxOf(source_->frame(), path_);
     remark_ = source_->remark();
+    sampleType_ = source_->sampleType();
 }
 
 bool ImageFile::isCurrent() const {

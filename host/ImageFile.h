@@ -30,6 +30,9 @@ public:
     /// Which image was taken where that was not clear, in words; otherwise empty.
     const std::string& remark() const { return remark_; }
 
+    /// One of kSampleTypes; empty: another one.
+    const std::string& sampleType() const { return sampleType_; }
+
     /// Whether the file still is what was opened.
     bool isCurrent() const;
 
@@ -43,6 +46,7 @@ private:
     std::uintmax_t byteCount_ = 0;
     zefra::Box box_;
     std::string remark_;
+    std::string sampleType_;
     std::unique_ptr<ImageReader> source_;
 };
 

@@ -10,6 +10,7 @@ namespace {
 
 constexpr std::size_t kBarColumns = 20;
 constexpr std::size_t kMessageColumns = 50;  // with the bar, within the 80 of a small terminal
+constexpr std::size_t kStatusColumns = 79;
 constexpr std::chrono::milliseconds kDrawInterval{50};
 constexpr char kEraseLine[] = "\r\x1b[K";
 
@@ -36,15 +37,21 @@ void ProgressDisplay::fraction(double done) {
     draw();
 }
 
+void ProgressDisplay::status(const std::string& text) {
+    show(text.substr(0, kStatusColumns));
+}
+
 void ProgressDisplay::draw() {
+    const auto filled = static_cast<std::size_t>(fraction_ * static_cast<double>(kBarColumns));
+    const std::string bar = std::string(filled, '#') + std::string(kBarColumns - filled, ' ');
+    show(fmt::format("{} [{}] {:3.0f}%", message_, bar, fraction_ * 100.0));
+}
+
+void ProgressDisplay::show(const std::string& text) {
     const Clock::time_point now = Clock::now();
     if (!isShown_ || now < nextDraw_) return;
     nextDraw_ = now + kDrawInterval;
-    const auto filled = static_cast<std::size_t>(fraction_ * static_cast<double>(kBarColumns));
-    const std::string bar = std::string(filled, '#') + std::string(kBarColumns - filled, ' ');
-    const std::string line =
-        fmt::format("{}{} [{}] {:3.0f}%", kEraseLine, message_, bar, fraction_ * 100.0);
-    std::fputs(line.c_str(), terminal_);
+    std::fputs((kEraseLine + text).c_str(), terminal_);
     std::fflush(terminal_);
     isDrawn_ = true;
 }

@@ -24,12 +24,15 @@ public:
     void message(const std::string& text);
     /// @param done  0 to 1
     void fraction(double done);
+    /// A text alone, of work that does not say how far it is.
+    void status(const std::string& text);
     void clear();
 
 private:
     using Clock = std::chrono::steady_clock;
 
     void draw();
+    void show(const std::string& text);
 
     std::FILE* terminal_;
     bool isShown_;

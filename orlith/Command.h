@@ -3,6 +3,7 @@
 #include <CLI/CLI.hpp>
 #include <stdexcept>
 #include <string>
+#include <vector>
 
 namespace orlith {
 
@@ -27,6 +28,8 @@ class Cancelled {};
 // Each adds its command to the program; running it leaves the exit status in `status`.
 void addPattern(CLI::App& program, int& status);
 void addGenerate(CLI::App& program, int& status);
+/// @param programWords  of the program that makes an image of an image
+void addBake(CLI::App& program, const std::vector<std::string>& programWords, int& status);
 void addConvert(CLI::App& program, int& status);
 void addInfo(CLI::App& program, int& status);
 void addEval(CLI::App& program, int& status);

@@ -16,11 +16,15 @@ namespace {
 enum class Work : int { None, Cancellable, Done };
 std::atomic<Work> work{Work::None};
 
+std::atomic<bool> endsInOrder{false};
+std::atomic<int> signalPutOff{0};
+
 char unfinishedFolder[PATH_MAX];
 char unfinishedFile[PATH_MAX];
 std::atomic<bool> hasUnfinishedFile{false};
 
-static_assert(std::atomic<Work>::is_always_lock_free && std::atomic<bool>::is_always_lock_free,
+static_assert(std::atomic<Work>::is_always_lock_free && std::atomic<bool>::is_always_lock_free &&
+                  std::atomic<int>::is_always_lock_free,
               "a signal handler may not take a lock");
 
 void removeUnfinishedFile() {
@@ -30,7 +34,7 @@ void removeUnfinishedFile() {
 }
 
 void onInterrupt(int) {
-    if (work != Work::None && !host::Host::cancelRequested()) {
+    if (endsInOrder || (work != Work::None && !host::Host::cancelRequested())) {
         host::Host::requestCancel();
         return;
     }
@@ -39,10 +43,19 @@ void onInterrupt(int) {
 }
 
 /// Ends the program as if the signal had never been caught.
-void onEnd(int signal) {
-    removeUnfinishedFile();
+void endBy(int signal) {
     std::signal(signal, SIG_DFL);
     raise(signal);
+}
+
+void onEnd(int signal) {
+    if (endsInOrder) {
+        signalPutOff = signal;
+        host::Host::requestCancel();
+        return;
+    }
+    removeUnfinishedFile();
+    endBy(signal);
 }
 
 }  // namespace
@@ -54,6 +67,20 @@ void catchSignals() {
         if (std::signal(signal, onEnd) == SIG_IGN) std::signal(signal, SIG_IGN);
     }
     std::signal(SIGXFSZ, SIG_IGN);
+    // Whoever ignores it never hears how a child has ended.
+    std::signal(SIGCHLD, SIG_DFL);
+}
+
+void endBySignal() {
+    if (const int signal = signalPutOff; signal != 0) endBy(signal);
+}
+
+OrderlyEnd::OrderlyEnd() {
+    endsInOrder = true;
+}
+
+OrderlyEnd::~OrderlyEnd() {
+    endsInOrder = false;
 }
 
 CancelScope::CancelScope() {

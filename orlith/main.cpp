@@ -5,6 +5,7 @@
 #include <algorithm>
 #include <cerrno>
 #include <cstdio>
+#include <cstring>
 #include <new>
 #include <system_error>
 #include <utility>
@@ -20,9 +21,8 @@ namespace orlith {
 namespace {
 
 constexpr char kDescription[] =
-    "Makes look-up tables from processed test patterns, and reads, converts, evaluates and "
-    "compares "
-    "them.\nExit status: 0 done, 1 failed, 2 wrong usage, 130 cancelled.";
+    "Makes look-up tables of image programs and processed test patterns, and reads, converts, "
+    "evaluates and compares them.\nExit status: 0 done, 1 failed, 2 wrong usage, 130 cancelled.";
 
 /// Where a standard stream is closed, the next file that is opened would take its place and get
 /// what is printed. Something that refuses to be used takes it instead.
@@ -32,6 +32,17 @@ void holdStandardStreams() {
         // The lowest free number is this stream's.
         static_cast<void>(open("/dev/null", stream == STDIN_FILENO ? O_WRONLY : O_RDONLY) == 0);
     }
+}
+
+/// Takes the words of another program away, which stand behind "--" and are nobody else's.
+std::vector<std::string> takeProgramWords(int& argc, char** argv) {
+    char** const end = argv + argc;
+    if (argc < 2 || std::strcmp(argv[1], "bake") != 0) return {};
+    char** const mark =
+        std::find_if(argv, end, [](const char* word) { return std::strcmp(word, "--") == 0; });
+    if (mark == end) return {};
+    argc = static_cast<int>(mark - argv);
+    return {mark + 1, end};
 }
 
 /// What fails because the user has cancelled is no failure.
@@ -130,11 +141,13 @@ int main(int argc, char** argv) {
     orlith::catchSignals();
 
     int status = orlith::kDone;
+    const auto programWords = orlith::takeProgramWords(argc, argv);
     CLI::App program(orlith::kDescription, "orlith");
     program.set_version_flag("--version", "orlith " ORLITH_VERSION);
     program.require_subcommand(1);
     orlith::addPattern(program, status);
     orlith::addGenerate(program, status);
+    orlith::addBake(program, programWords, status);
     orlith::addConvert(program, status);
     orlith::addInfo(program, status);
     orlith::addEval(program, status);
@@ -142,6 +155,7 @@ int main(int argc, char** argv) {
     orlith::addRun(program, status);
     orlith::addPanel(program, status);
     status = orlith::run(program, argc, argv, status);
+    orlith::endBySignal();
     // Results that could not be delivered (a full disk behind a redirection) are a failure.
     errno = 0;
     if ((std::fflush(stdout) != 0 || std::ferror(stdout) != 0) && status == orlith::kDone) {

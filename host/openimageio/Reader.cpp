@@ -17,6 +17,7 @@
 #include "host/openimageio/Codec.h"
 #include "host/openimageio/HeldImage.h"
 #include "host/openimageio/Parts.h"
+#include "host/openimageio/SampleType.h"
 
 namespace host::openimageio {
 namespace {
@@ -73,6 +74,7 @@ public:
 
     const ImageFrame& frame() const override { return frame_; }
     const std::string& remark() const override { return chosen_.remark; }
+    std::string sampleType() const override { return sampleTypeOf(chosen_.spec); }
 
     const float* line(int line) override {
         try {

@@ -108,6 +108,13 @@ void setSampleType(OIIO::ImageSpec& spec, const std::string& type) {
     }
 }
 
+std::string sampleTypeOf(const OIIO::ImageSpec& spec) {
+    for (const SampleType& each : kTypes) {
+        if (isOfType(spec, each)) return std::string(each.name);
+    }
+    return "";
+}
+
 int codeMaxOf(const std::string& type) {
     for (const SampleType& each : kTypes) {
         const bool isPartOfInteger =

@@ -9,6 +9,9 @@ namespace host::openimageio {
 /// Asks for one of kSampleTypes in what is going to be written.
 void setSampleType(OIIO::ImageSpec& spec, const std::string& type);
 
+/// Which of kSampleTypes a file has; empty: none of them.
+std::string sampleTypeOf(const OIIO::ImageSpec& spec);
+
 /// The largest code of an integer type that the library makes of 16 bits, which loses what is to be
 /// rounded; 0 for the others.
 int codeMaxOf(const std::string& type);

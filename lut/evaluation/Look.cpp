@@ -5,6 +5,7 @@
 #include <cstdint>
 #include <limits>
 #include <random>
+#include <utility>
 
 namespace Orlith::LUT {
 namespace {
@@ -103,9 +104,13 @@ void finishDifferences(Differences& differences, std::uint64_t count) {
     }
 }
 
-LookComparison::LookComparison(const Evaluator& a, const Evaluator& b) : a_(a), b_(b) {
+LookComparison::LookComparison(ColourWay a, ColourWay b) : a_(std::move(a)), b_(std::move(b)) {
     colours_.reserve(3 * kBlockColours);
 }
+
+LookComparison::LookComparison(const Evaluator& a, const Evaluator& b)
+    : LookComparison([&a](float* rgb, std::size_t count) { a.apply(rgb, rgb, count); },
+                     [&b](float* rgb, std::size_t count) { b.apply(rgb, rgb, count); }) {}
 
 void LookComparison::add(const RGB& colour) {
     colours_.insert(colours_.end(), {colour[0], colour[1], colour[2]});
@@ -113,10 +118,10 @@ void LookComparison::add(const RGB& colour) {
 }
 
 void LookComparison::flush() {
-    resultsA_.resize(colours_.size());
-    resultsB_.resize(colours_.size());
-    a_.apply(colours_.data(), resultsA_.data(), colours_.size() / 3);
-    b_.apply(colours_.data(), resultsB_.data(), colours_.size() / 3);
+    resultsA_ = colours_;
+    resultsB_ = colours_;
+    a_(resultsA_.data(), colours_.size() / 3);
+    b_(resultsB_.data(), colours_.size() / 3);
     for (std::size_t i = 0; i < colours_.size(); ++i) {
         const float* const colour = colours_.data() + i / 3 * 3;
         addDifference(differences_[i % 3], resultsA_[i], resultsB_[i],

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <array>
+#include <cstddef>
 #include <cstdint>
 #include <functional>
 #include <vector>
@@ -37,9 +38,14 @@ using Differences = std::array<Difference, 3>;
 /// The largest of the three channels.
 double largestOf(const Differences& differences);
 
-/// Sends colours through two tables and keeps the differences.
+/// Sends so many colours, triples red, green, blue, through something in place.
+using ColourWay = std::function<void(float* rgb, std::size_t colourCount)>;
+
+/// Sends colours through two looks and keeps the differences.
 class LookComparison {
 public:
+    LookComparison(ColourWay a, ColourWay b);
+    /// Of two tables; their Evaluators outlive this.
     LookComparison(const Evaluator& a, const Evaluator& b);
 
     void add(const RGB& colour);
@@ -50,8 +56,8 @@ public:
 private:
     void flush();
 
-    const Evaluator& a_;
-    const Evaluator& b_;
+    const ColourWay a_;
+    const ColourWay b_;
     std::vector<float> colours_;  // that wait
     std::vector<float> resultsA_;
     std::vector<float> resultsB_;

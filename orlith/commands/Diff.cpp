@@ -98,19 +98,12 @@ void printJson(const ol::Differences& differences, bool isWithin) {
     fmt::print("}}\n");
 }
 
-/// --from is for the table whose name does not tell its format, if the other one's does.
-ReadOptions readingOf(const std::string& path, const ReadOptions& options) {
-    ReadOptions reading = options;
-    if (isReadable(formatOf(path, ""))) reading.from.clear();
-    return reading;
-}
-
 int runDiff(const DiffOptions& options) {
     if (options.a == "-" && options.b == "-") {
         throw UsageError("only one of the tables can come from standard input");
     }
-    const Table a = readWholeTable(options.a, readingOf(options.a, options.reading));
-    const Table b = readWholeTable(options.b, readingOf(options.b, options.reading));
+    const Table a = readWholeTable(options.a, readingAmong(options.a, options.reading));
+    const Table b = readWholeTable(options.b, readingAmong(options.b, options.reading));
     const ol::Differences differences =
         options.reading.isStrict ? compareSamples(a, b) : compareLooks(a, b, options.colours);
     const bool isWithin = largestOf(differences) <= options.tolerance;

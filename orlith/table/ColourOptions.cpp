@@ -35,6 +35,20 @@ ol::InterpolationMode ColourOptions::bookMode() const {
     throw UsageError("--mode tetrahedral does not go with --strict");
 }
 
+ColourWay wayThrough(const boost::shared_ptr<const ol::LUT>& table, const ColourOptions& options,
+                     bool isStrict) {
+    if (!isStrict) {
+        return [evaluator = options.evaluator(table)](float* rgb, std::size_t colourCount) {
+            evaluator.apply(rgb, rgb, colourCount);
+        };
+    }
+    return [table, mode = options.bookMode(), extrapolates = options.extrapolates](
+               float* rgb, std::size_t colourCount) {
+        for (float* const end = rgb + 3 * colourCount; rgb != end; rgb += 3)
+            table->interpolate(ol::RGB(rgb), mode, extrapolates).copy_out(rgb);
+    };
+}
+
 void addColourOptions(CLI::App& command, ColourOptions& options) {
     const std::map<std::string, Method> methods = {{"step", Method::Step},
                                                    {"staggered", Method::Staggered},

@@ -4,6 +4,7 @@
 #include <boost/smart_ptr/shared_ptr.hpp>
 
 #include "lut/Evaluator.h"
+#include "lut/evaluation/Look.h"
 
 namespace orlith {
 
@@ -18,6 +19,13 @@ struct ColourOptions {
     /// @throws UsageError  it has none: tetrahedral
     Orlith::LUT::InterpolationMode bookMode() const;
 };
+
+using Orlith::LUT::ColourWay;
+
+/// The way through a table: as its maker means it, or by the book.
+/// @throws UsageError  by the book there is no tetrahedral method
+ColourWay wayThrough(const boost::shared_ptr<const Orlith::LUT::LUT>& table,
+                     const ColourOptions& options, bool isStrict);
 
 void addColourOptions(CLI::App& command, ColourOptions& options);
 

@@ -94,6 +94,12 @@ std::string sampleCounts(const Table& table) {
 
 }  // namespace
 
+ReadOptions readingAmong(const std::string& path, const ReadOptions& options) {
+    ReadOptions reading = options;
+    if (isReadable(formatOf(path, ""))) reading.from.clear();
+    return reading;
+}
+
 void addFromOption(CLI::App& command, ReadOptions& options) {
     command
         .add_option_function<std::string>(

@@ -26,6 +26,9 @@ struct ReadOptions {
 void addFromOption(CLI::App& command, ReadOptions& options);
 void addReadOptions(CLI::App& command, ReadOptions& options);
 
+/// Of several tables, --from is for those whose names do not tell their formats.
+ReadOptions readingAmong(const std::string& path, const ReadOptions& options);
+
 /// A table and what its file said of it.
 struct Table {
     boost::shared_ptr<Orlith::LUT::LUT> lut;

@@ -26,7 +26,7 @@ TEST_F(UsageTest, HelpAndManPageHaveEveryCommandAndOption) {
     const std::string overview = output("--help");
     std::set<std::string> offered = longOptions(overview);
     for (const std::string command :
-         {"pattern", "generate", "convert", "info", "eval", "diff", "run", "panel"}) {
+         {"pattern", "generate", "bake", "convert", "info", "eval", "diff", "run", "panel"}) {
         test::expectIn(overview, "\n  " + command + " ");
         test::expectIn(manual, "\n.SS " + command + "\n");
         const std::string help = output(command + " --help");
@@ -51,6 +51,11 @@ TEST_F(UsageTest, WrongUsageIsOneLineAndStatusTwo) {
         {"generate p.exr o.cube --knob lut1d", "\"lut1d\" has to be NAME=VALUE"},
         {"pattern p.exr --size 0x10", "has to be a whole number from 2 to 129"},
         {"pattern -", "an image goes to a file"},
+        {"bake o.cube", "there is nothing to bake: give tables (--lut), or -- PROGRAM, or both"},
+        {"bake o.cube -- cp p.exr {out}", "{in} is missing behind --"},
+        {"bake o.cube --size 130 -- cp {in} {out}", "a pattern has at most 129 points a side"},
+        {"bake o.cube cp {in} {out}", "(see orlith --help and orlith bake --help)"},
+        {"bake o.cube --lut - --lut -", "only one of the tables can come from standard input"},
         {"convert a.cube b.cms --lut1d 1", "\"1\" has to be 0 (none) or a whole number"},
         {"generate p.exr o.cms --lut1d 65537", "from 2 to 65536"},
         {"convert a.cube b.3dl --scale nan", "\"nan\" has to be a number"},
