@@ -1,7 +1,10 @@
 #pragma once
 
+#include <cstddef>
+#include <functional>
 #include <memory>
 #include <string>
+#include <vector>
 
 #include "zefra/Export.h"
 
@@ -69,6 +72,34 @@ public:
     virtual void finish() = 0;
 };
 
+/// A file that becomes another one with other colours and everything else as it is: the other
+/// channels, parts and layers, windows, tiles, metadata, and the types of samples. What is about
+/// the old colours goes: thumbnails, checksums.
+struct ImageCopy {
+    /// Changes so many colours in place: triples red, green, blue, as the file has them; integers
+    /// stand for 0 to 1. Called from many threads at once.
+    using Change = std::function<void(float* rgb, std::size_t colourCount)>;
+
+    std::string from;
+    std::string to;          ///< another file; its extension names the format
+    ImageChoice choice;      ///< whose colours change
+    std::string sampleType;  ///< one of kSampleTypes; empty: as it is, or the nearest held
+    int threadCount = 0;     ///< 0: as many as there are processors
+    Change change;
+    /// Told again and again how much is done, up to 1. What it throws ends the copy.
+    std::function<void(double done)> progress;
+};
+
+/// What was copied, and what of it was not.
+struct CopiedImage {
+    int width = 0;  // of the part whose colours have changed
+    int height = 0;
+    std::string sampleType;           ///< of its colours
+    std::string remark;               ///< as ImageReader::remark
+    std::vector<std::string> losses;  ///< what the target's format does not hold, in a line each,
+                                      ///< such as: holds no channel Z; left out
+};
+
 class ImageCodec {
 public:
     virtual ~ImageCodec() = default;
@@ -84,6 +115,10 @@ public:
     /// @throws Error      with path and reason; a type that the format does not hold
     virtual std::unique_ptr<ImageWriter> create(const std::string& path, const ImageFrame& frame,
                                                 const std::string& sampleType) const = 0;
+
+    /// Copies an image in bands of lines. The target is removed unless it is whole.
+    /// @throws Error  with path and reason; also what the source is, such as deep, or lacks
+    virtual CopiedImage copy(const ImageCopy& copy) const = 0;
 };
 
 /// The codec that goes with the running program. The first call loads it, and it stays loaded.

@@ -4,13 +4,12 @@
 
 #include <algorithm>
 #include <array>
-#include <cerrno>
 #include <cstdint>
-#include <fstream>
 #include <limits>
 #include <system_error>
 
 #include "host/Error.h"
+#include "host/ImageChecks.h"
 #include "host/ImageLines.h"
 
 namespace host {
@@ -19,30 +18,6 @@ namespace {
 namespace fs = std::filesystem;
 
 constexpr std::array<zefra::Channel, 3> kChannels = {zefra::kRed, zefra::kGreen, zefra::kBlue};
-
-// No compression makes that much of a byte: a file that claims more is not believed.
-constexpr std::uintmax_t kMaxPixelsPerByte = 65536;
-
-/// Answers for the commonest mistakes in the system's words.
-void expectReadableFile(const std::string& path) {
-    std::error_code failure;
-    if (fs::is_directory(path, failure)) throw Error(path, "is a folder");
-    errno = 0;
-    if (!std::ifstream(path, std::ios::binary)) {
-        throw Error(path, std::generic_category().message(errno != 0 ? errno : ENOENT));
-    }
-}
-
-void expectCredibleSize(const ImageWindow& data, std::uintmax_t byteCount,
-                        const std::string& path) {
-    if (data.width <= 0 || data.height <= 0) throw Error(path, "has no pixels");
-    const auto width = static_cast<std::uintmax_t>(data.width);
-    const auto height = static_cast<std::uintmax_t>(data.height);
-    if (width * height / kMaxPixelsPerByte > byteCount) {
-        throw Error(path,
-                    fmt::format("claims {} x {} pixels in {} bytes", width, height, byteCount));
-    }
-}
 
 /// The file's data window, with rows counted upward from the bottom of its display window.
 zefra::Box boxOf(const ImageFrame& frame, const std::string& path) {
@@ -69,7 +44,7 @@ ImageFile::ImageFile(std::string path, const ImageChoice& choice) : path_(std::m
     byteCount_ = fs::file_size(path_, ignored);
 
     source_ = imageCodec().open(path_, choice);
-    expectCredibleSize(source_->frame().data, byteCount_, path_);
+    expectCredibleSize(source_->frame().data, path_);
     box_ = boxOf(source_->frame(), path_);
     remark_ = source_->remark();
     sampleType_ = source_->sampleType();

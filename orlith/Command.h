@@ -30,6 +30,7 @@ void addPattern(CLI::App& program, int& status);
 void addGenerate(CLI::App& program, int& status);
 /// @param programWords  of the program that makes an image of an image
 void addBake(CLI::App& program, const std::vector<std::string>& programWords, int& status);
+void addApply(CLI::App& program, int& status);
 void addConvert(CLI::App& program, int& status);
 void addInfo(CLI::App& program, int& status);
 void addEval(CLI::App& program, int& status);

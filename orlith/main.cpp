@@ -21,8 +21,9 @@ namespace orlith {
 namespace {
 
 constexpr char kDescription[] =
-    "Makes look-up tables of image programs and processed test patterns, and reads, converts, "
-    "evaluates and compares them.\nExit status: 0 done, 1 failed, 2 wrong usage, 130 cancelled.";
+    "Makes look-up tables of image programs and processed test patterns, applies them to images, "
+    "and reads, converts, evaluates and compares them.\nExit status: 0 done, 1 failed, 2 wrong "
+    "usage, 130 cancelled.";
 
 /// Where a standard stream is closed, the next file that is opened would take its place and get
 /// what is printed. Something that refuses to be used takes it instead.
@@ -148,6 +149,7 @@ int main(int argc, char** argv) {
     orlith::addPattern(program, status);
     orlith::addGenerate(program, status);
     orlith::addBake(program, programWords, status);
+    orlith::addApply(program, status);
     orlith::addConvert(program, status);
     orlith::addInfo(program, status);
     orlith::addEval(program, status);

@@ -1,6 +1,7 @@
 #include "host/openimageio/Codec.h"
 
 #include "host/Error.h"
+#include "host/ImageChecks.h"
 #include "host/Text.h"
 
 namespace host::openimageio {
@@ -15,6 +16,10 @@ public:
     std::unique_ptr<ImageWriter> create(const std::string& path, const ImageFrame& frame,
                                         const std::string& sampleType) const override {
         return createImage(path, frame, sampleType);
+    }
+    CopiedImage copy(const ImageCopy& copy) const override {
+        expectReadableFile(copy.from);
+        return copyImage(copy);
     }
 };
 

@@ -15,10 +15,6 @@
 namespace host::openimageio {
 namespace {
 
-/// More parts than anyone looks through are not counted: a film has one for each frame, and the
-/// more there are before one, the longer it takes to find.
-constexpr int kMostParts = 256;
-
 /// Red, green and blue of each layer; the one without a name first.
 using Layers = std::map<std::string, std::array<int, 3>>;
 

@@ -9,6 +9,10 @@
 
 namespace host::openimageio {
 
+/// More parts than anyone looks through are not counted: a film has one for each frame, and the
+/// more there are before one, the longer it takes to find.
+constexpr int kMostParts = 256;
+
 /// The image that is taken of a file.
 struct ChosenImage {
     int part = 0;

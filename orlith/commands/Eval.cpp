@@ -2,7 +2,6 @@
 
 #include <array>
 #include <cstdio>
-#include <functional>
 #include <iostream>
 #include <string>
 #include <vector>
@@ -34,26 +33,9 @@ bool parseColour(std::string_view word, float& number) {
     return true;
 }
 
-/// Sends packed colours through the table in place, as its maker means it or by the book.
-using WayThrough = std::function<void(std::vector<float>& colours)>;
-
-WayThrough wayThrough(const Table& table, const EvalOptions& options) {
-    const ColourOptions& colours = options.colours;
-    if (options.reading.isStrict) {
-        return [lut = table.lut, mode = colours.bookMode(),
-                extrapolates = colours.extrapolates](std::vector<float>& rgb) {
-            for (std::size_t i = 0; i < rgb.size(); i += 3)
-                lut->interpolate(ol::RGB(&rgb[i]), mode, extrapolates).copy_out(&rgb[i]);
-        };
-    }
-    return [evaluator = colours.evaluator(table.lut)](std::vector<float>& rgb) {
-        evaluator.apply(rgb.data(), rgb.data(), rgb.size() / 3);
-    };
-}
-
 /// Prints what becomes of the colours, and forgets them.
-void evaluate(const WayThrough& way, std::vector<float>& colours) {
-    way(colours);
+void evaluate(const ColourWay& way, std::vector<float>& colours) {
+    way(colours.data(), colours.size() / 3);
     for (std::size_t i = 0; i < colours.size(); i += 3)
         fmt::print("{}\n", colourText(&colours[i]));
     colours.clear();
@@ -73,7 +55,7 @@ bool addColour(std::string_view line, std::vector<float>& colours) {
 }
 
 /// Takes colours together as long as more are waiting; whoever waits for an answer gets it at once.
-void evaluateInput(const WayThrough& way) {
+void evaluateInput(const ColourWay& way) {
     constexpr std::size_t kMostFloats = 3 * 4096;
     std::ios::sync_with_stdio(false);  // so that the stream knows what is waiting
     std::vector<float> colours;
@@ -100,9 +82,8 @@ int runEval(const EvalOptions& options) {
     if (options.path == "-" && options.colour.empty()) {
         throw UsageError("table and colours cannot both come from standard input");
     }
-    const Table table = options.reading.isStrict ? readTableAndWarn(options.path, options.reading)
-                                                 : readWholeTable(options.path, options.reading);
-    const auto way = wayThrough(table, options);
+    const Table table = readTableForColours(options.path, options.reading);
+    const ColourWay way = wayThrough(table.lut, options.colours, options.reading.isStrict);
     if (colour.empty()) {
         evaluateInput(way);
     } else {

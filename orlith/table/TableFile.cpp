@@ -219,4 +219,8 @@ Table readWholeTable(const std::string& path, const ReadOptions& options) {
     return table;
 }
 
+Table readTableForColours(const std::string& path, const ReadOptions& options) {
+    return options.isStrict ? readTableAndWarn(path, options) : readWholeTable(path, options);
+}
+
 }  // namespace orlith

@@ -54,6 +54,9 @@ Table readTableAndWarn(const std::string& path, const ReadOptions& options);
 /// Likewise, but fewer samples are a failure: what is missing is no black.
 Table readWholeTable(const std::string& path, const ReadOptions& options);
 
+/// Reads a table to send colours through: a whole one; by the book, one as the format says.
+Table readTableForColours(const std::string& path, const ReadOptions& options);
+
 /// Size as people write it: "33 x 33 x 33 points", or "1024 entries".
 std::string sizeText(const Orlith::LUT::LUT& lut);
 

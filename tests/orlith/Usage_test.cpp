@@ -25,8 +25,8 @@ TEST_F(UsageTest, HelpAndManPageHaveEveryCommandAndOption) {
 
     const std::string overview = output("--help");
     std::set<std::string> offered = longOptions(overview);
-    for (const std::string command :
-         {"pattern", "generate", "bake", "convert", "info", "eval", "diff", "run", "panel"}) {
+    for (const std::string command : {"pattern", "generate", "bake", "apply", "convert", "info",
+                                      "eval", "diff", "run", "panel"}) {
         test::expectIn(overview, "\n  " + command + " ");
         test::expectIn(manual, "\n.SS " + command + "\n");
         const std::string help = output(command + " --help");
@@ -63,6 +63,13 @@ TEST_F(UsageTest, WrongUsageIsOneLineAndStatusTwo) {
         {"diff - - --from cube", "only one of the tables"},
         {"info a.3dl --read-output-bitdepth 32",
          "has to be detect, input or a number of bits from 1 to 31"},
+        {"apply a.exr b.exr", "--lut is required"},
+        {"apply a.exr - --lut a.cube", "an image goes to a file"},
+        {"apply a.exr b.exr --lut - --lut -", "only one of the tables"},
+        {"apply a.#.exr b.#.exr --lut a.cube --frames 5-1", "\"5-1\" has to be frames from A to B"},
+        {"apply a.#.exr b.#.exr --lut a.cube --frames 1-5x0", "such as 1-100 or 1-100x2"},
+        {"apply a.#.exr b.exr --lut a.cube --frames 1-5", "\"b.exr\" has to have a place"},
+        {"apply a.%4.exr b.#.exr --lut a.cube --frames 1-5", "\"a.%4.exr\" has to have a place"},
         {"eval a.cube 0 0 x", "\"x\" is not a number"},
         {"diff a.cube b.cube --tolerance nan", "\"nan\" has to be a number"},
     };

@@ -1,0 +1,201 @@
+#include <fmt/format.h>
+
+#include <algorithm>
+#include <optional>
+#include <set>
+#include <string>
+#include <vector>
+
+#include "host/Error.h"
+#include "host/ImageChecks.h"
+#include "host/ImageCodec.h"
+#include "host/ProgressDisplay.h"
+#include "orlith/Command.h"
+#include "orlith/Frames.h"
+#include "orlith/ImageOptions.h"
+#include "orlith/Messages.h"
+#include "orlith/Options.h"
+#include "orlith/OutputFile.h"
+#include "orlith/table/ColourOptions.h"
+#include "orlith/table/TableFile.h"
+
+namespace orlith {
+namespace {
+
+struct ApplyOptions {
+    std::string image;
+    std::string output;
+    std::vector<std::string> tables;
+    ReadOptions reading;
+    ColourOptions colours;
+    host::ImageChoice choice;
+    std::string sampleType;
+    std::optional<Frames> frames;
+    int threadCount = 0;
+    bool isQuiet = false;
+};
+
+void expectUsable(const ApplyOptions& options) {
+    if (options.output == "-") {
+        throw UsageError("an image goes to a file whose name has its format's extension");
+    }
+    if (std::count(options.tables.begin(), options.tables.end(), "-") > 1) {
+        throw UsageError("only one of the tables can come from standard input");
+    }
+    if (!options.frames) return;
+    for (const std::string& pattern : {options.image, options.output}) {
+        if (!hasFrameNumber(pattern)) {
+            throw UsageError(fmt::format(
+                "with --frames \"{}\" has to have a place for the number, such as #### or %04d",
+                pattern));
+        }
+    }
+}
+
+/// The way through all tables, one after the other.
+ColourWay readTables(const ApplyOptions& options) {
+    std::vector<ColourWay> ways;
+    for (const std::string& path : options.tables) {
+        const Table table = readTableForColours(path, readingAmong(path, options.reading));
+        ways.push_back(wayThrough(table.lut, options.colours, options.reading.isStrict));
+    }
+    return [ways](float* rgb, std::size_t colourCount) {
+        for (const ColourWay& each : ways)
+            each(rgb, colourCount);
+    };
+}
+
+/// Sends images through the tables, with one bar for all of them.
+class Application {
+public:
+    explicit Application(const ApplyOptions& options)
+        : options_(options), change_(readTables(options)) {}
+
+    int run() {
+        if (options_.frames) {
+            applyToFrames(*options_.frames);
+        } else {
+            progress_.message(options_.output);
+            apply(options_.image, options_.output);
+        }
+        return kDone;
+    }
+
+private:
+    void applyToFrames(const Frames& frames) {
+        imageCount_ = frames.count();
+        // What is not there is told before hours have gone by.
+        for (std::int64_t i = 0; i < imageCount_; ++i)
+            host::expectReadableFile(frameName(options_.image, frames.number(i)));
+        progress_.message(options_.output);
+        for (; imagesDone_ < imageCount_; ++imagesDone_) {
+            const int frame = frames.number(imagesDone_);
+            apply(frameName(options_.image, frame), frameName(options_.output, frame));
+        }
+    }
+
+    void apply(const std::string& image, const std::string& path) {
+        OutputFile output(path);
+        host::ImageCopy copy;
+        copy.from = image;
+        copy.to = output.stagedPath();
+        copy.choice = options_.choice;
+        copy.sampleType = options_.sampleType;
+        copy.threadCount = options_.threadCount;
+        copy.change = change_;
+        copy.progress = [&](double done) {
+            output.expectNotCancelled();
+            progress_.fraction((static_cast<double>(imagesDone_) + done) /
+                               static_cast<double>(imageCount_));
+        };
+        const host::CopiedImage copied = copyImage(copy, output);
+        output.deliver();
+        report(image, output, copied);
+    }
+
+    static host::CopiedImage copyImage(const host::ImageCopy& copy, const OutputFile& output) {
+        output.expectNotCancelled();
+        try {
+            return host::imageCodec().copy(copy);
+        } catch (const host::Error& error) {
+            throw Failure(output.inWords(error.what()));
+        }
+    }
+
+    void report(const std::string& image, const OutputFile& output,
+                const host::CopiedImage& copied) {
+        if (!copied.remark.empty()) {
+            warnOnce(image, copied.remark + "; choose with --part or --layer");
+        }
+        for (const std::string& loss : copied.losses)
+            warnOnce(output.name(), loss);
+        if (options_.isQuiet) return;
+        progress_.clear();
+        output.print(fmt::format("{}: {} x {} pixels, {}\n", printable(output.name()), copied.width,
+                                 copied.height, copied.sampleType));
+    }
+
+    /// The frames of a sequence are alike: what is said of one is not said of the others again.
+    void warnOnce(const std::string& file, const std::string& text) {
+        if (!warnings_.insert(text).second) return;
+        progress_.clear();
+        warn(fmt::format("{}: {}", file, text));
+    }
+
+    const ApplyOptions& options_;
+    const ColourWay change_;
+    host::ProgressDisplay progress_;
+    std::int64_t imageCount_ = 1;
+    std::int64_t imagesDone_ = 0;
+    std::set<std::string> warnings_;  // that were given
+};
+
+int runApply(const ApplyOptions& options) {
+    expectUsable(options);
+    return Application(options).run();
+}
+
+}  // namespace
+
+void addApply(CLI::App& program, int& status) {
+    CLI::App* const command =
+        program.add_subcommand("apply", "Send the colours of images through tables");
+    const auto options = std::make_shared<ApplyOptions>();
+    command->add_option("IMAGE", options->image, "Image to read: EXR, TIFF, DPX, PNG, JPEG ...")
+        ->required();
+    command
+        ->add_option("OUT_IMAGE", options->output, "Image to write; its extension names the format")
+        ->required();
+    command
+        ->add_option("--lut", options->tables,
+                     "Table; may be given again: colours go through one after the other")
+        ->type_name("LUT")
+        ->allow_extra_args(false)
+        ->required();
+    addFromOption(*command, options->reading);
+    addReadOptions(*command, options->reading);
+    addColourOptions(*command, options->colours);
+    addImageChoice(*command, options->choice);
+    addSampleType(*command, options->sampleType);
+    command
+        ->add_option_function<std::string>(
+            "--frames",
+            [options](const std::string& word) {
+                options->frames = parseFrames(word);
+                if (options->frames) return;
+                throw CLI::ValidationError(
+                    "--frames",
+                    fmt::format("\"{}\" has to be frames from A to B, such as 1-100 or 1-100x2",
+                                word));
+            },
+            "Images of a sequence: their names have #### or %04d in place of the number")
+        ->type_name("A-B");
+    constexpr int kMostThreads = 1024;
+    addInteger(*command, "--threads", 1, kMostThreads,
+               "Threads that share an image; if not given, one for each processor",
+               [options](int count) { options->threadCount = count; });
+    command->add_flag("--quiet", options->isQuiet, "Do not say what was written");
+    command->callback([options, &status] { status = runApply(*options); });
+}
+
+}  // namespace orlith
