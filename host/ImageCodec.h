@@ -48,7 +48,7 @@ public:
     /// What was taken where it was not clear, such as: holds 3 parts: took part 0 "rgba"; or empty.
     virtual const std::string& remark() const = 0;
 
-    /// Type of the samples: one of kSampleTypes; empty: another one.
+    /// Type of the samples: one of kSampleTypes, or named in the same manner: "double", "uint14".
     virtual std::string sampleType() const = 0;
 
     /// A line of the data window, counted downward from 0: triples red, green, blue, which stand

@@ -30,7 +30,7 @@ public:
     /// Which image was taken where that was not clear, in words; otherwise empty.
     const std::string& remark() const { return remark_; }
 
-    /// One of kSampleTypes; empty: another one.
+    /// As ImageReader::sampleType.
     const std::string& sampleType() const { return sampleType_; }
 
     /// Whether the file still is what was opened.

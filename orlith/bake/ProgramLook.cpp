@@ -4,6 +4,7 @@
 
 #include <boost/algorithm/string/replace.hpp>
 #include <filesystem>
+#include <set>
 #include <system_error>
 
 #include "host/Error.h"
@@ -51,8 +52,8 @@ void expectImage(const std::string& path, const std::string& programName) {
 /// A program may hold less of a number than the images do that it is given.
 void warnOfCoarseness(const std::string& path, const std::string& name, bool isFloatSent) {
     const std::string type = host::ImageFile(path).sampleType();
-    const bool isFine = type.empty() || type == "float" || (type == "uint16" && !isFloatSent);
-    if (isFine) return;
+    const std::set<std::string> coarseTypes = {"uint8", "uint10", "uint12", "half"};
+    if (coarseTypes.count(type) == 0 && !(type == "uint16" && isFloatSent)) return;
     warn(fmt::format("{}: has {} samples, {{in}} has {}: the table's colours are as coarse", name,
                      type, isFloatSent ? "float" : "uint16"));
 }
