@@ -1,6 +1,7 @@
 #pragma once
 
 #include <array>
+#include <boost/smart_ptr/shared_ptr.hpp>
 #include <cstddef>
 #include <cstdint>
 #include <functional>
@@ -64,6 +65,11 @@ private:
     std::uint64_t count_ = 0;
     Differences differences_;
 };
+
+/// How far two looks are apart: at the points of the larger table, and at random colours of both.
+Differences compareLooks(const boost::shared_ptr<const LUT>& a,
+                         const boost::shared_ptr<const LUT>& b, Evaluator::Method method,
+                         Evaluator::Outside outside);
 
 /// Adds two results of a channel to its difference; mean and square are sums until the end.
 void addDifference(Difference& difference, float a, float b, const RGB& at);

@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "lut/LUT3D.h"
+#include "lut/evaluation/Deviation.h"
 #include "lut/evaluation/Look.h"
 #include "lut/io/interchange/Fitting.h"
 #include "orlith/Command.h"
@@ -15,7 +16,6 @@
 #include "orlith/bake/ImageProgram.h"
 #include "orlith/bake/ProgramLook.h"
 #include "orlith/table/ColourOptions.h"
-#include "orlith/table/Deviation.h"
 #include "orlith/table/TableFile.h"
 #include "orlith/table/TableOutput.h"
 #include "orlith/table/Verification.h"
@@ -161,8 +161,8 @@ int runBake(const BakeOptions& options) {
         output.expectNotCancelled();
     } else {
         origin.judge = [&](const boost::shared_ptr<ol::LUT>& written) {
-            const TableLook tables{row.look, *row.tables.front().lut};
-            const TableLook file{wayThrough(written, options.colours, false), *written};
+            const ol::TableLook tables{row.look, *row.tables.front().lut};
+            const ol::TableLook file{wayThrough(written, options.colours, false), *written};
             return "from the tables " + deviationText(largestDeviation(tables, file));
         };
     }

@@ -2,6 +2,7 @@
 
 #include "lut/evaluation/Look.h"
 #include "lut/io/interchange/Fitting.h"
+#include "lut/io/table/Proof.h"
 #include "orlith/Command.h"
 #include "orlith/Messages.h"
 #include "orlith/Options.h"
@@ -21,20 +22,6 @@ struct ConvertOptions {
     TableOutputOptions output;
 };
 
-/// Takes a pre-LUT away that changes nothing, such as the one that a .csp file has to have.
-void dropIdentityPreLUT(ol::LUT& lut) {
-    const ol::Shaper* const shapers[] = {&lut.inputShaper, &lut.outputShaper};
-    for (const ol::Shaper* const shaper : shapers) {
-        const auto& entries = shaper->entries;
-        if (entries.size() != 2) return;
-        for (unsigned c = 0; c < 3; ++c) {
-            if (shaper->counts[c] != 2.0F || entries[0][c] != 0.0F || entries[1][c] != 1.0F) return;
-        }
-    }
-    lut.inputShaper = {};
-    lut.outputShaper = {};
-}
-
 std::string rangeText(const ol::Range& range) {
     return fmt::format("{:.6g} {:.6g} {:.6g} to {:.6g} {:.6g} {:.6g}", range.min[0], range.min[1],
                        range.min[2], range.max[0], range.max[1], range.max[2]);
@@ -52,7 +39,7 @@ int runConvert(const ConvertOptions& options) {
     const bool isStrict = options.reading.isStrict;
     const TableOutput target(options.output, isStrict);
     const Table table = readWholeTable(options.input, options.reading);
-    dropIdentityPreLUT(*table.lut);
+    ol::dropIdentityPreLUT(*table.lut);
     ol::Fitted fitted{table.lut, "", false};
     if (isStrict) {
         warnOfLosses(options.output.path, target.extension(), *table.lut);

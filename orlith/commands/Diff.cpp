@@ -62,18 +62,6 @@ ol::Differences compareSamples(const Table& a, const Table& b) {
     return differences;
 }
 
-/// As people see it: at the points of the larger table and at random colours of both.
-ol::Differences compareLooks(const Table& a, const Table& b, const ColourOptions& colours) {
-    const ol::Evaluator evaluatorA = colours.evaluator(a.lut);
-    const ol::Evaluator evaluatorB = colours.evaluator(b.lut);
-    ol::LookComparison comparison(evaluatorA, evaluatorB);
-    const auto add = [&](const ol::RGB& colour) { comparison.add(colour); };
-    forEachInput(a.pointCount >= b.pointCount ? *a.lut : *b.lut, false, add);
-    forEachRandom(inputRangeOf(*a.lut), ol::kRandomColours / 2, add);
-    forEachRandom(inputRangeOf(*b.lut), ol::kRandomColours / 2, add);
-    return comparison.finish();
-}
-
 void printText(const ol::Differences& differences) {
     fmt::print("{:<8}{:>14}{:>14}{:>14}  {}\n", "", "largest", "mean", "rms", "largest at");
     for (unsigned c = 0; c < 3; ++c) {
@@ -105,7 +93,9 @@ int runDiff(const DiffOptions& options) {
     const Table a = readWholeTable(options.a, readingAmong(options.a, options.reading));
     const Table b = readWholeTable(options.b, readingAmong(options.b, options.reading));
     const ol::Differences differences =
-        options.reading.isStrict ? compareSamples(a, b) : compareLooks(a, b, options.colours);
+        options.reading.isStrict
+            ? compareSamples(a, b)
+            : ol::compareLooks(a.lut, b.lut, options.colours.method, options.colours.outside());
     const bool isWithin = largestOf(differences) <= options.tolerance;
     if (options.isJson) {
         printJson(differences, isWithin);

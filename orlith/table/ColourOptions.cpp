@@ -13,10 +13,12 @@ using Method = ol::Evaluator::Method;
 
 }  // namespace
 
+ol::Evaluator::Outside ColourOptions::outside() const {
+    return extrapolates ? ol::Evaluator::Outside::Extrapolate : ol::Evaluator::Outside::Clamp;
+}
+
 ol::Evaluator ColourOptions::evaluator(const boost::shared_ptr<const ol::LUT>& table) const {
-    return ol::Evaluator(
-        table, method,
-        extrapolates ? ol::Evaluator::Outside::Extrapolate : ol::Evaluator::Outside::Clamp);
+    return ol::Evaluator(table, method, outside());
 }
 
 ol::InterpolationMode ColourOptions::bookMode() const {

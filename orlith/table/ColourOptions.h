@@ -13,6 +13,7 @@ struct ColourOptions {
     Orlith::LUT::Evaluator::Method method = Orlith::LUT::Evaluator::Method::Trilinear;
     bool extrapolates = false;
 
+    Orlith::LUT::Evaluator::Outside outside() const;
     Orlith::LUT::Evaluator evaluator(const boost::shared_ptr<const Orlith::LUT::LUT>& table) const;
 
     /// The library's own mode of that name.

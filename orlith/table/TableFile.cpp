@@ -2,18 +2,13 @@
 
 #include <fmt/format.h>
 
-#include <unistd.h>
-
-#include <boost/algorithm/string/case_conv.hpp>
-#include <cerrno>
 #include <cmath>
 #include <filesystem>
-#include <stdexcept>
-#include <system_error>
+#include <vector>
 
 #include "lut/Exception.h"
-#include "lut/evaluation/Range.h"
 #include "lut/io/Registry.h"
+#include "lut/io/table/FileError.h"
 #include "orlith/Command.h"
 #include "orlith/Messages.h"
 #include "orlith/Options.h"
@@ -22,7 +17,6 @@ namespace orlith {
 namespace {
 
 namespace ol = Orlith::LUT;
-namespace property = Orlith::Property;
 
 /// "detect", "input" or a number of bits.
 std::string parseOutputBitDepth(const std::string& text, int& bits) {
@@ -34,37 +28,6 @@ std::string parseOutputBitDepth(const std::string& text, int& bits) {
         return "has to be detect, input or a number of bits from 1 to 31";
     }
     return "";
-}
-
-void setReaderProperties(ol::LUTFileReader& reader, const ReadOptions& options) {
-    const auto set = [&](const char* name, auto property) { reader.setProperty(name, property); };
-    set("interchange",
-        property::makeProperty<property::Int>("interchange", options.isStrict ? 0 : 1));
-    set("format3DL", property::makeProperty<property::String>("format3DL", options.format3DL));
-    set("outputBitDepth",
-        property::makeProperty<property::Int>("outputBitDepth", options.outputBitDepth));
-    set("normalizeOutput",
-        property::makeProperty<property::Int>("normalizeOutput", options.normalizeOutput ? 1 : 0));
-}
-
-/// The place of a failure: the file, and the line where there is one.
-std::string place(const std::string& name, const ol::LUTFileReader& reader) {
-    return reader.lineNumber() == 0 ? name : fmt::format("{}:{}", name, reader.lineNumber());
-}
-
-/// Answers for the commonest mistakes in the system's words.
-void expectReadableFile(const std::string& path, const std::string& name) {
-    std::error_code ignored;
-    if (std::filesystem::is_directory(path, ignored)) throw Failure(name + ": is a folder");
-    if (access(path.c_str(), R_OK) != 0) {
-        throw Failure(fmt::format("{}: {}", name, std::generic_category().message(errno)));
-    }
-}
-
-/// The reason that a reader gives for its failure.
-std::string reasonOf(const ol::LUTFileReader& reader) {
-    const auto remarks = reader.remarks();
-    return remarks.empty() ? "" : fmt::format(" ({})", remarks.back().text);
 }
 
 /// What by the book is no table may be one as its maker meant it.
@@ -80,16 +43,26 @@ std::string adviceOn(const std::string& file, const ReadOptions& options) {
     }
 }
 
-void warnOfRemarks(const Table& table) {
-    for (const ol::Remark& remark : table.remarks) {
+void warnOfRemarks(const std::string& name, const std::vector<ol::Remark>& remarks) {
+    for (const ol::Remark& remark : remarks) {
         const std::string line = remark.line == 0 ? "" : fmt::format(":{}", remark.line);
-        warn(fmt::format("{}{}: {}", table.name, line, remark.text));
+        warn(fmt::format("{}{}: {}", name, line, remark.text));
     }
 }
 
-std::string sampleCounts(const Table& table) {
-    return fmt::format("{}: holds {} samples, its table has {} points", table.name,
-                       table.samplesRead, table.pointCount);
+boost::shared_ptr<ol::LUTFileReader> makeReader(const std::string& name,
+                                                const std::string& extension) {
+    try {
+        return ol::createReader("", true, extension);
+    } catch (const ol::Exception& exception) {
+        throw Failure(
+            fmt::format("{}: {}", name, formatProblem(exception.message(), extension, "--from")));
+    }
+}
+
+void warnOfSurplus(const Table& table) {
+    if (table.samplesRead == table.pointCount) return;
+    warn(fmt::format("{}: {}", table.name, sampleCounts(table)));
 }
 
 }  // namespace
@@ -128,31 +101,12 @@ void addReadOptions(CLI::App& command, ReadOptions& options) {
                      "Scale a .3dl file down whose codes exceed their bits");
 }
 
-std::string withDot(const std::string& extension) {
-    return extension.empty() || extension.front() == '.' ? extension : "." + extension;
-}
-
-std::string formatOf(const std::string& path, const std::string& givenExtension) {
-    std::string extension = givenExtension;
-    if (extension.empty()) ol::splitExtension(path, nullptr, &extension);
-    boost::algorithm::to_lower(extension, std::locale::classic());
-    return extension;
-}
-
 bool isReadable(const std::string& extension) {
     try {
         return ol::createReader("", true, extension) != nullptr;
     } catch (const ol::Exception&) {
         return false;
     }
-}
-
-std::string formatProblem(const char* message, const std::string& extension, const char* option) {
-    std::string text = message;
-    if (const std::size_t place = text.find("%s"); place != std::string::npos) {
-        text.replace(place, 2, extension);
-    }
-    return fmt::format("{} (name the format by {})", text, option);
 }
 
 std::string sizeText(const ol::LUT& lut) {
@@ -170,52 +124,31 @@ std::string colourText(const float* rgb) {
 Table readTable(const std::string& path, const ReadOptions& options, const std::string& name) {
     const bool isStandardInput = path == "-";
     const std::string file = isStandardInput ? "/dev/stdin" : path;
-    Table table;
-    table.name = !name.empty() ? name : isStandardInput ? "standard input" : path;
-    table.extension = formatOf(path, options.from);
-    boost::shared_ptr<ol::LUTFileReader> reader;
+    const std::string shown = !name.empty() ? name : isStandardInput ? "standard input" : path;
+    const std::string extension = formatOf(path, options.from);
+    const auto reader = makeReader(shown, extension);
     try {
-        reader = ol::createReader(file, true, table.extension);
-    } catch (const ol::Exception& exception) {
-        throw Failure(fmt::format("{}: {}", table.name,
-                                  formatProblem(exception.message(), table.extension, "--from")));
+        Table table = readTable(*reader, file, shown, options);
+        table.extension = extension;
+        return table;
+    } catch (const ol::FileError& error) {
+        warnOfRemarks(shown, error.remarks());
+        throw Failure(error.what() + adviceOn(file, options));
     }
-    expectReadableFile(file, table.name);
-    setReaderProperties(*reader, options);
-    try {
-        table.lut = reader->read(file);
-    } catch (const ol::Exception& exception) {
-        // The last remark is the failure's reason; those before may have led to it.
-        table.remarks = reader->remarks();
-        if (!table.remarks.empty()) table.remarks.pop_back();
-        warnOfRemarks(table);
-        throw Failure(fmt::format("{}: {}{}{}", place(table.name, *reader), exception.message(),
-                                  reasonOf(*reader), adviceOn(file, options)));
-    } catch (const std::length_error&) {
-        throw Failure(
-            fmt::format("{}: declares a size that no table can have", place(table.name, *reader)));
-    } catch (const std::bad_alloc&) {
-        throw Failure(
-            fmt::format("{}: needs more memory than there is", place(table.name, *reader)));
-    }
-    table.samplesRead = reader->sampleCount();
-    table.pointCount = pointCount(*table.lut);
-    table.remarks = reader->remarks();
-    return table;
 }
 
 Table readTableAndWarn(const std::string& path, const ReadOptions& options) {
     Table table = readTable(path, options);
-    warnOfRemarks(table);
-    if (table.samplesRead != table.pointCount) warn(sampleCounts(table));
+    warnOfRemarks(table.name, table.remarks);
+    warnOfSurplus(table);
     return table;
 }
 
 Table readWholeTable(const std::string& path, const ReadOptions& options) {
     Table table = readTable(path, options);
-    if (!table.isFilled()) throw Failure(sampleCounts(table));
-    warnOfRemarks(table);
-    if (table.samplesRead != table.pointCount) warn(sampleCounts(table));
+    if (!table.isFilled()) throw Failure(fmt::format("{}: {}", table.name, sampleCounts(table)));
+    warnOfRemarks(table.name, table.remarks);
+    warnOfSurplus(table);
     return table;
 }
 

@@ -2,15 +2,14 @@
 
 #include <fmt/format.h>
 
-#include <algorithm>
 #include <cerrno>
-#include <cmath>
 #include <stdexcept>
 
 #include "lut/Exception.h"
+#include "lut/evaluation/Deviation.h"
 #include "lut/io/Registry.h"
+#include "lut/io/table/Proof.h"
 #include "orlith/Command.h"
-#include "orlith/table/Deviation.h"
 #include "orlith/table/Verification.h"
 
 namespace orlith {
@@ -41,10 +40,6 @@ std::string refusal(const ol::Exception& exception, const std::string& extension
 
 void setFlag(ol::LUTFileWriter& writer, const char* name, int value) {
     writer.setProperty(name, Orlith::Property::makeProperty<Orlith::Property::Int>(name, value));
-}
-
-TableLook lookOf(const ol::Evaluator& evaluator, const ol::LUT& table) {
-    return {[&](float* rgb, std::size_t count) { evaluator.apply(rgb, rgb, count); }, table};
 }
 
 }  // namespace
@@ -122,24 +117,6 @@ void TableOutput::writeTable(const OutputFile& output,
     }
 }
 
-/// What half a unit of the format's last digit, and single precision, leave of a look.
-double TableOutput::precisionFor(const ol::LUT& lut) const {
-    float largest = 1.0F;
-    const float* const samples = lut.data();
-    for (std::uint64_t i = 0; i < 3 * pointCount(lut); ++i) {
-        if (std::isfinite(samples[i])) largest = std::max(largest, std::fabs(samples[i]));
-    }
-    // A pre-LUT's six digits are multiplied by the slope of what is behind it.
-    const double steepness = lut.inputShaper.empty() && lut.outputShaper.empty()
-                                 ? 1.0
-                                 : static_cast<double>(std::max(lut.width(), 2));
-    const double relative = 1e-6 * static_cast<double>(largest) * steepness;
-    if (extension_ != ".3dl") return 2e-6 + relative;
-    return 0.6 / (std::ldexp(1.0, options3DL_.outputBits) - 1.0) /
-               static_cast<double>(std::fabs(options3DL_.scale)) +
-           relative;
-}
-
 /// Reads the file back as its format means it.
 Table TableOutput::readBack(const OutputFile& output) const {
     try {
@@ -154,16 +131,13 @@ Table TableOutput::readBack(const OutputFile& output) const {
 std::string TableOutput::compareLooks(const OutputFile& output, const ol::Fitted& fitted,
                                       const Origin& origin, const std::string& clipping) const {
     const Table back = readBack(output);
-    const ol::Evaluator source(origin.table);
-    const ol::Evaluator written(back.lut);
-    const double deviation =
-        largestDeviation(lookOf(source, *origin.table), lookOf(written, *back.lut));
+    const double deviation = ol::lookDeviation(origin.table, back.lut);
     std::string words = "largest deviation " + deviationText(deviation);
     std::vector<std::string> causes = origin.causes;
     if (!clipping.empty()) causes.push_back(clipping);
     if (options_.writing.hasPreLUT()) causes.emplace_back("the pre-LUT as asked for");
     if (options_.writing.scale || options_.writing.offset) causes.emplace_back("scale and offset");
-    const bool isPrecise = deviation <= precisionFor(*fitted.lut);
+    const bool isPrecise = deviation <= ol::precisionOf(extension_, options3DL_, *fitted.lut);
     if (!isPrecise && causes.empty()) {
         // A steep shaper or a tiny domain takes more digits than a line of text has.
         if (ol::whyNotHeld(*fitted.lut, ".vf").empty()) {

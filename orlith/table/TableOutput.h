@@ -61,7 +61,6 @@ private:
     Table readBack(const OutputFile& output) const;
     std::string compareLooks(const OutputFile& output, const Orlith::LUT::Fitted& fitted,
                              const Origin& origin, const std::string& clipping) const;
-    double precisionFor(const Orlith::LUT::LUT& lut) const;
 
     const TableOutputOptions& options_;
     const bool isStrict_;

@@ -27,16 +27,6 @@ bool isSame(float a, float b) {
     return a == b || (std::isnan(a) && std::isnan(b));
 }
 
-/// The code that a .3dl writer aims at for a value, before rounding.
-double codeOf(double value, const Options3DL& options) {
-    const double codeMax = std::ldexp(1.0, options.outputBits) - 1.0;
-    double code =
-        value * codeMax * static_cast<double>(options.scale) + static_cast<double>(options.offset);
-    if (std::isnan(code)) code = 0.0;
-    code = std::clamp(code, -2147483648.0, 2147483647.0);
-    return options.clampOutput ? std::clamp(code, 0.0, codeMax) : code;
-}
-
 /// The code behind a value that a .3dl reader gave: it takes Scratch's own scale and offset off.
 double codeBehind(double value, const Options3DL& options) {
     const double codeMax = std::ldexp(1.0, options.outputBits) - 1.0;
@@ -104,30 +94,10 @@ std::string whyUnreadable(const std::string& extension, const ol::LUT& table) {
 
 std::string clippingText(const ol::LUT& lut, const std::string& extension,
                          const Options3DL& options) {
-    if (extension != ".3dl" || !options.clampOutput) return "";
-    Options3DL unclamped = options;
-    unclamped.clampOutput = false;
-    const double codeMax = std::ldexp(1.0, options.outputBits) - 1.0;
-    std::uint64_t count = 0;
-    float farthest = 0.5F;
-    const float* const samples = lut.data();
-    for (std::uint64_t i = 0; i < 3 * pointCount(lut); ++i) {
-        const double code = codeOf(static_cast<double>(samples[i]), unclamped);
-        if (code >= -0.5 && code <= codeMax + 0.5) continue;  // half a code is no loss
-        ++count;
-        if (!(std::fabs(samples[i] - 0.5F) <= std::fabs(farthest - 0.5F))) farthest = samples[i];
-    }
-    return count == 0 ? "" : fmt::format("clipped: {} numbers, the farthest {}", count, farthest);
-}
-
-ReadOptions readingOf(const std::string& extension, const Options3DL& options) {
-    ReadOptions reading;
-    reading.from = extension;
-    reading.format3DL = options.dialect;
-    // A Lustre file says its bits itself, and the reader warns when it is told again.
-    reading.outputBitDepth =
-        options.dialect == "lustre" ? ReadOptions::kDetect : options.outputBits;
-    return reading;
+    const ol::Clipping clipping = clippingOf(lut, extension, options);
+    if (clipping.numberCount == 0) return "";
+    return fmt::format("clipped: {} numbers, the farthest {}", clipping.numberCount,
+                       clipping.farthest);
 }
 
 double verify(const std::string& path, const std::string& name, const std::string& extension,

@@ -3,10 +3,13 @@
 #include <string>
 
 #include "lut/LUT.h"
+#include "lut/io/table/Proof.h"
 #include "orlith/table/TableFile.h"
 #include "orlith/table/WriteOptions.h"
 
 namespace orlith {
+
+using Orlith::LUT::readingOf;
 
 /// Why a file of a table, which the format's writer takes, could not be read again; empty if it
 /// can.
@@ -16,9 +19,6 @@ std::string whyUnreadable(const std::string& extension, const Orlith::LUT::LUT& 
 /// all samples fit, and for other formats.
 std::string clippingText(const Orlith::LUT::LUT& lut, const std::string& extension,
                          const Options3DL& options);
-
-/// How to read a file that was written with these options.
-ReadOptions readingOf(const std::string& extension, const Options3DL& options);
 
 /// Reads a file back by the book with the library's own reader and compares it with the table that
 /// was written, within the precision of the format.

@@ -7,11 +7,6 @@ namespace orlith {
 namespace {
 
 namespace ol = Orlith::LUT;
-namespace property = Orlith::Property;
-
-// As the operator has them: 97/99 in single precision, and the code of Scratch's black.
-constexpr double kScratchScale = 0.9797979593276978;
-constexpr double kScratchOffset = 15.0;
 
 constexpr int kDefaultPreLUTEntries = 1024;
 
@@ -23,14 +18,13 @@ const std::vector<std::string>& bitDepthWords() {
 }
 
 Options3DL WriteOptions::options3DL() const {
-    const bool isScratch = format3DL == "scratch";
     Options3DL options;
     options.inputBits = bitDepth;
     options.outputBits = outputBitDepth == 0 ? bitDepth : outputBitDepth;
     options.clampOutput = clampOutput;
     options.dialect = format3DL;
-    options.scale = static_cast<float>(scale.value_or(isScratch ? kScratchScale : 1.0));
-    options.offset = static_cast<float>(offset.value_or(isScratch ? kScratchOffset : 0.0));
+    options.scale = static_cast<float>(scale.value_or(ol::ownScale(format3DL)));
+    options.offset = static_cast<float>(offset.value_or(ol::ownOffset(format3DL)));
     return options;
 }
 
@@ -72,20 +66,6 @@ void addWriteOptions(CLI::App& command, WriteOptions& options) {
             "--style1d", options.style1d,
             "Ramp of that pre-LUT: linear, or logarithmic, which is a smooth step (default)")
         ->check(CLI::IsMember({"linear", "logarithmic"}));
-}
-
-void setWriterProperties(ol::LUTFileWriter& writer, const Options3DL& options) {
-    const auto set = [&](const char* name, auto property) { writer.setProperty(name, property); };
-    set("inputBitDepth", property::makeProperty<property::Int>("inputBitDepth", options.inputBits));
-    set("outputBitDepth",
-        property::makeProperty<property::Int>("outputBitDepth", options.outputBits));
-    set("clampOutput",
-        property::makeProperty<property::Int>("clampOutput", options.clampOutput ? 1 : 0));
-    set("format3DL", property::makeProperty<property::String>("format3DL", options.dialect));
-    set("scale",
-        property::makeProperty<property::Double>("scale", static_cast<double>(options.scale)));
-    set("offset",
-        property::makeProperty<property::Double>("offset", static_cast<double>(options.offset)));
 }
 
 void addPreLUT(ol::LUT& lut, const WriteOptions& options) {

@@ -6,19 +6,11 @@
 #include <vector>
 
 #include "lut/LUT.h"
-#include "lut/io/LUTFileWriter.h"
+#include "lut/io/table/Options3DL.h"
 
 namespace orlith {
 
-/// The options of a .3dl writer, which other formats ignore.
-struct Options3DL {
-    int inputBits = 10;
-    int outputBits = 10;
-    bool clampOutput = true;
-    std::string dialect = "flame";
-    float scale = 1.0F;
-    float offset = 0.0F;
-};
+using Orlith::LUT::Options3DL;
 
 /// How a table file is written.
 struct WriteOptions {
@@ -39,9 +31,6 @@ struct WriteOptions {
 };
 
 void addWriteOptions(CLI::App& command, WriteOptions& options);
-
-/// Hands the options to a writer as its properties.
-void setWriterProperties(Orlith::LUT::LUTFileWriter& writer, const Options3DL& options);
 
 /// Gives a table without a pre-LUT the ramp that lut1d and style1d ask for, if they do.
 void addPreLUT(Orlith::LUT::LUT& lut, const WriteOptions& options);
