@@ -1,0 +1,390 @@
+// The Python module: what Python sees, and its documentation. The first line of a text is the
+// signature that help() and inspect show.
+
+#include <pybind11/pybind11.h>
+#include <pybind11/stl.h>
+
+#include <algorithm>
+#include <cmath>
+#include <limits>
+#include <optional>
+#include <string>
+#include <utility>
+#include <variant>
+#include <vector>
+
+#include "lut/Exception.h"
+#include "lut/evaluation/Look.h"
+#include "lut/io/table/FileError.h"
+#include "lut/io/table/FileFormat.h"
+#include "python/Arrays.h"
+#include "python/Files.h"
+#include "python/Pattern.h"
+#include "python/Tables.h"
+#include "python/Text.h"
+
+namespace python {
+namespace {
+
+namespace py = pybind11;
+namespace ol = Orlith::LUT;
+
+constexpr char kErrorText[] =
+    R"(A file that cannot be read or written, or a table that its format cannot hold.
+
+file    its name, as it was given
+line    where the reader stumbled, counted from 1; None for the file as a whole
+reason  what is wrong, without the place)";
+
+constexpr char kTableText[] =
+    R"(A look-up table: a curve (kind "1D") or a lattice (kind "3D") of colours.
+
+Table(samples, domain=None) makes one from an array of float32 or float64, which is copied: (N, 3)
+for a curve, (R, G, B, 3) for a lattice. domain is what the first and the last point stand for: two
+numbers or two triples; None is 0 to 1.
+
+Calling the table sends colours through it.)";
+
+constexpr char kInitText[] =
+    "__init__(self, samples, domain=None)\n--\n\n"
+    "See the class. TypeError, ValueError: no such samples or domain.";
+
+constexpr char kFromFunctionText[] =
+    R"(from_function(f, size=33, domain=None, kind="3D")
+--
+
+Makes a table of what a function gives for the inputs of its points.
+
+f       called once, with float32 colours: (size, size, size, 3), or (size, 3) for kind "1D";
+        returns as many
+size    points a side, 2 or more
+domain  as of Table)";
+
+constexpr char kCallText[] = R"(__call__(self, colours, mode="trilinear", extrapolate=False)
+--
+
+Sends colours through the table and returns new ones of the same shape.
+
+colours      (..., 3), of any shape and strides: float32 gives float32, float64 gives float64;
+             computed in single precision
+mode         "step", "staggered", "trilinear", "tetrahedral" or "cubic"; curves ignore it
+extrapolate  beyond the domain: True goes on in straight lines, False stays at its edge
+
+Other threads run meanwhile; they must not write to the table's samples.
+TypeError, ValueError: another type, another last axis, no such mode.)";
+
+constexpr char kWriteText[] =
+    R"(write(self, path, *, format=None, size=None, bit_depth=10, output_bit_depth=None, clamp_output=True, format_3dl="flame", scale=None, offset=None)
+--
+
+Writes the table as other programs read it, reads it back, compares the looks, and only then puts
+the file in place: it is whole, or what was there before stays. Returns a Written.
+
+What the format cannot hold is resampled; a domain that has to shrink and numbers that are clipped
+are a UserWarning each.
+
+path              str, bytes or os.PathLike
+format            where the name does not tell: "cube", "csp", "3dl", "cms", "cub", "blut", "vf"
+size              points a side, 2 to 256; None: the table's own, or 33 where a curve becomes a lattice
+
+For .3dl files, others ignore them:
+bit_depth         4, 8, 10, 12 or 16 bits of the input grid
+output_bit_depth  likewise of the codes; None: as bit_depth
+clamp_output      limit the codes to their bits
+format_3dl        "flame", "lustre" or "scratch"
+scale, offset     of the codes; None: those of format_3dl
+
+Error: the format has no such table, or the file cannot be written as it should be.)";
+
+constexpr char kReadText[] =
+    R"(read(path, *, strict=False, format=None, format_3dl="auto", output_bit_depth="detect", normalize_output=False)
+--
+
+Reads a table as the programs that wrote it mean it; what was forgiven or not used is in its remarks.
+
+path              str, bytes or os.PathLike
+strict            True: by the letter of the format, as the library reads for the operator
+format            where the name does not tell: "cube", "itx", "csp", "3dl", "cms", "cub", "blut",
+                  "vf", "vfz", "gz"
+
+For .3dl files, others ignore them:
+format_3dl        "auto", "flame", "lustre" or "scratch"
+output_bit_depth  bits of the codes from 1 to 31, "detect", or "input": as those of the input grid
+normalize_output  scale values down until the largest is 1
+
+Error: no such file or format, or it is no such table.)";
+
+constexpr char kConvertText[] = R"(convert(input, output, **options)
+--
+
+Reads one file and writes another with the same look: read(input).write(output, **options).)";
+
+constexpr char kDiffText[] = R"(diff(a, b, mode="trilinear", extrapolate=False)
+--
+
+How far two looks are apart, at the points of the larger table and at 10,000 random colours of both
+domains. a and b are tables or paths. Returns a Difference.)";
+
+constexpr char kPatternText[] = R"(pattern(size=33)
+--
+
+The test pattern of size x size x size colours, 2 to 129, as an image: float32, (height, width, 3),
+its top line first. Patches are 7 x 7 pixels. Write it as an image, send that through any program,
+and give what comes out to from_pattern.)";
+
+constexpr char kFromPatternText[] = R"(from_pattern(image)
+--
+
+The table that a processed pattern holds: the centre of each patch, as it is.
+
+image  (height, width, 3) or more channels, of which the first three count; float32 or float64, its
+       top line first
+
+Whether the pattern is upright and its patches are flat is not looked at, as "orlith generate" does.
+TypeError, ValueError: another type, a size that no pattern has.)";
+
+/// The type of orlith.Error, which lives as long as the process.
+PyObject* errorType = nullptr;
+
+void setError(const py::object& text, const py::object& file, const py::object& line,
+              const py::object& reason) {
+    const py::object error = py::reinterpret_borrow<py::object>(errorType)(text);
+    error.attr("file") = file;
+    error.attr("line") = line;
+    error.attr("reason") = reason;
+    PyErr_SetObject(errorType, error.ptr());
+}
+
+void translate(std::exception_ptr failure) {
+    try {
+        if (failure) std::rethrow_exception(std::move(failure));
+    } catch (const ol::FileError& error) {
+        setError(toText(error.what()), toFileName(error.file()), toLine(error.line()),
+                 toText(error.reason()));
+    } catch (const ol::Exception& exception) {
+        const py::object text = toText(exception.message());
+        setError(text, py::none(), py::none(), text);
+    }
+}
+
+void defineError(py::module_& module) {
+    py::dict none;
+    for (const char* const name : {"file", "line", "reason"})
+        none[name] = py::none();
+    errorType = PyErr_NewExceptionWithDoc("orlith.Error", kErrorText, nullptr, none.ptr());
+    if (errorType == nullptr) throw py::error_already_set();
+    module.attr("Error") = py::reinterpret_borrow<py::object>(errorType);
+    py::register_exception_translator(&translate);
+}
+
+template <class Value>
+void expectOneOf(const char* name, const Value& value, const std::vector<Value>& values) {
+    if (std::find(values.begin(), values.end(), value) != values.end()) return;
+    throw py::value_error(std::string(name) + " has to be one of " +
+                          std::string(py::str(py::cast(values))) + ", not " +
+                          std::string(py::repr(py::cast(value))));
+}
+
+int toBits(const std::variant<int, std::string>& given) {
+    if (const int* const bits = std::get_if<int>(&given)) {
+        if (*bits >= 1 && *bits <= 31) return *bits;
+    } else if (std::get<std::string>(given) == "detect") {
+        return ol::ReadOptions::kDetect;
+    } else if (std::get<std::string>(given) == "input") {
+        return ol::ReadOptions::kAsInput;
+    }
+    throw py::value_error("output_bit_depth has to be \"detect\", \"input\" or 1 to 31");
+}
+
+Table read(const py::object& path, bool isStrict, const std::optional<std::string>& format,
+           const std::string& format3DL, const std::variant<int, std::string>& outputBitDepth,
+           bool normalizeOutput) {
+    expectOneOf<std::string>("format_3dl", format3DL, {"auto", "flame", "lustre", "scratch"});
+    const ol::ReadOptions options{ol::withDot(format.value_or("")), isStrict, format3DL,
+                                  toBits(outputBitDepth), normalizeOutput};
+    const std::string file = toPath(path);
+    const py::gil_scoped_release others;
+    return readFile(file, options);
+}
+
+/// Tells Python of losses, which its user may have made an error.
+void warnOf(const std::string& path, const std::vector<std::string>& losses) {
+    const py::gil_scoped_acquire hold;
+    const std::string place = path + ": ";
+    for (const std::string& loss : losses) {
+        const py::object text = toText(place + loss);
+        if (PyErr_WarnEx(PyExc_UserWarning, PyUnicode_AsUTF8(text.ptr()), 1) != 0) {
+            throw py::error_already_set();
+        }
+    }
+}
+
+/// A factor or a summand of codes, in the writer's precision.
+float toSingle(const char* name, double number) {
+    if (!(std::fabs(number) <= static_cast<double>(std::numeric_limits<float>::max()))) {
+        throw py::value_error(std::string(name) + " has to be a finite number");
+    }
+    return static_cast<float>(number);
+}
+
+Written write(const Table& table, const py::object& path, const std::optional<std::string>& format,
+              std::optional<int> size, int bitDepth, std::optional<int> outputBitDepth,
+              bool clampOutput, const std::string& format3DL, std::optional<double> scale,
+              std::optional<double> offset) {
+    const std::vector<int> depths = {4, 8, 10, 12, 16};
+    expectOneOf("bit_depth", bitDepth, depths);
+    expectOneOf("output_bit_depth", outputBitDepth.value_or(bitDepth), depths);
+    expectOneOf<std::string>("format_3dl", format3DL, {"flame", "lustre", "scratch"});
+    if (size && (*size < 2 || *size > 256)) throw py::value_error("size has to be 2 to 256");
+    WriteOptions options;
+    options.to = ol::withDot(format.value_or(""));
+    options.size = size.value_or(0);
+    options.options3DL = {bitDepth,
+                          outputBitDepth.value_or(bitDepth),
+                          clampOutput,
+                          format3DL,
+                          toSingle("scale", scale.value_or(ol::ownScale(format3DL))),
+                          toSingle("offset", offset.value_or(ol::ownOffset(format3DL)))};
+    const std::string file = toPath(path);
+    const py::gil_scoped_release others;
+    return writeFile(table, file, options, [&](const auto& losses) { warnOf(file, losses); });
+}
+
+/// A table as it is, or that of a path.
+boost::shared_ptr<const ol::LUT> toLUT(const py::object& given) {
+    if (py::isinstance<Table>(given)) return given.cast<const Table&>().lut;
+    const std::string file = toPath(given);
+    const py::gil_scoped_release others;
+    return readFile(file, {}).lut;
+}
+
+struct Difference {
+    ol::Differences channels;
+};
+
+Difference diff(const py::object& a, const py::object& b, const std::string& mode,
+                bool extrapolates) {
+    const auto method = toMethod(mode);
+    const auto lutA = toLUT(a);
+    const auto lutB = toLUT(b);
+    const py::gil_scoped_release others;
+    return {ol::compareLooks(lutA, lutB, method, toOutside(extrapolates))};
+}
+
+/// A number of each channel, (3,).
+template <double ol::Difference::*kNumber>
+py::array_t<double> each(const Difference& difference) {
+    py::array_t<double> numbers(3);
+    std::transform(difference.channels.begin(), difference.channels.end(), numbers.mutable_data(),
+                   [](const ol::Difference& channel) { return channel.*kNumber; });
+    return numbers;
+}
+
+py::array_t<float> places(const Difference& difference) {
+    py::array_t<float> places({3, 3});
+    float* next = places.mutable_data();
+    for (const ol::Difference& channel : difference.channels)
+        next = std::copy_n(channel.at.data_block(), 3, next);
+    return places;
+}
+
+std::string describe(const Table& table) {
+    return "<orlith.Table " + kindOf(table) + ", " + std::string(py::str(sizeOf(table))) + ">";
+}
+
+void defineTable(py::module_& module) {
+    py::class_<Table> table(module, "Table", kTableText);
+    table
+        .def(py::init(&tableOfSamples), kInitText, py::arg("samples"),
+             py::arg("domain") = py::none())
+        .def_static("from_function", &tableOfFunction, kFromFunctionText, py::arg("f"),
+                    py::arg("size") = 33, py::arg("domain") = py::none(), py::arg("kind") = "3D")
+        .def("__call__", &evaluate, kCallText, py::arg("colours"), py::arg("mode") = "trilinear",
+             py::arg("extrapolate") = false)
+        .def("write", &write, kWriteText, py::arg("path"), py::kw_only(),
+             py::arg("format") = py::none(), py::arg("size") = py::none(),
+             py::arg("bit_depth") = 10, py::arg("output_bit_depth") = py::none(),
+             py::arg("clamp_output") = true, py::arg("format_3dl") = "flame",
+             py::arg("scale") = py::none(), py::arg("offset") = py::none())
+        .def("__repr__", &describe)
+        .def_property_readonly("kind", &kindOf, "\"1D\": a curve; \"3D\": a lattice.")
+        .def_property_readonly("size", &sizeOf,
+                               "Points along red, green and blue; of a curve (N,).")
+        .def_property_readonly(
+            "domain", &domainOf,
+            "float32 (2, 3): least and largest inputs of each channel. Behind a shaper, its own.")
+        .def_property_readonly(
+            "shaper", &shaperOf,
+            "None, or a float32 array (n, 2) for each of red, green and blue: inputs, and the\n"
+            "places in the table, from 0 to 1, that straight lines between them lead to.")
+        .def_property_readonly(
+            "samples", [](const py::object& self) { return samplesOf(self.cast<Table&>(), self); },
+            "float32 [r, g, b, channel], of a curve [i, channel]: the table's own memory, red\n"
+            "fastest, which lives as long as this array. What is written to it counts at once.")
+        .def_property_readonly("remarks", &remarksOf,
+                               "What the reader forgave or did not use: (line or None, text).");
+    table.attr("__module__") = "orlith";
+}
+
+void defineResults(py::module_& module) {
+    py::class_<Difference> difference(
+        module, "Difference", "How far two looks are apart, for red, green and blue; see diff.");
+    difference
+        .def_property_readonly("largest", &each<&ol::Difference::largest>,
+                               "float64 (3,); inf where only one of them is a number.")
+        .def_property_readonly("at", &places,
+                               "float32 (3, 3): the input where each channel's largest is.")
+        .def_property_readonly("mean", &each<&ol::Difference::mean>, "float64 (3,)")
+        .def_property_readonly("rms", &each<&ol::Difference::rootMeanSquare>,
+                               "float64 (3,): the root of the mean square.")
+        .def("__repr__", [](const py::object& self) {
+            return py::str("<orlith.Difference, largest {}>").format(self.attr("largest"));
+        });
+    difference.attr("__module__") = "orlith";
+
+    py::class_<Written> written(module, "Written", "What became of a table in its file.");
+    written.def_readonly("format", &Written::format, "The format's extension, \".cube\".")
+        .def_readonly("deviation", &Written::deviation,
+                      "The largest distance between the file's look and the table's, within the\n"
+                      "domain of both; None for a pipe or a device, which is not read back.")
+        .def_readonly("resampled", &Written::whyResampled,
+                      "Why the table could not go into the file as it is, \"a shaper\"; or \"\".")
+        .def_readonly("losses", &Written::losses,
+                      "What the format does not hold, in words; each was a UserWarning.")
+        .def("__repr__", [](const py::object& self) {
+            const py::object deviation = self.attr("deviation");
+            if (deviation.is_none()) return py::str("<orlith.Written, not read back>");
+            return py::str("<orlith.Written {}, largest deviation {:.2g}>")
+                .format(self.attr("format"), deviation);
+        });
+    written.attr("__module__") = "orlith";
+}
+
+void defineFunctions(py::module_& module) {
+    module.def("read", &read, kReadText, py::arg("path"), py::kw_only(), py::arg("strict") = false,
+               py::arg("format") = py::none(), py::arg("format_3dl") = "auto",
+               py::arg("output_bit_depth") = "detect", py::arg("normalize_output") = false);
+    module.def(
+        "convert",
+        [module](const py::object& input, const py::object& output, const py::kwargs& options) {
+            return module.attr("read")(input).attr("write")(output, **options);
+        },
+        kConvertText, py::arg("input"), py::arg("output"));
+    module.def("diff", &diff, kDiffText, py::arg("a"), py::arg("b"), py::arg("mode") = "trilinear",
+               py::arg("extrapolate") = false);
+    module.def("pattern", &makePattern, kPatternText, py::arg("size") = 33);
+    module.def("from_pattern", &tableOfPattern, kFromPatternText, py::arg("image"));
+}
+
+}  // namespace
+}  // namespace python
+
+PYBIND11_MODULE(_orlith, module) {
+    pybind11::options texts;
+    texts.disable_function_signatures();
+    module.attr("__version__") = ORLITH_VERSION;
+    python::defineError(module);
+    python::defineTable(module);
+    python::defineResults(module);
+    python::defineFunctions(module);
+}
