@@ -4,7 +4,7 @@
 
 namespace host::openimageio {
 
-HeldImage::HeldImage(int width, int height, OIIO::TypeDesc type, const Decode& decode)
+HeldImage::HeldImage(int width, int height, const OIIO::TypeDesc& type, const Decode& decode)
     : type_(type),
       lineSamples_(std::size_t{3} * static_cast<std::size_t>(width)),
       samples_(new std::byte[lineSamples_ * static_cast<std::size_t>(height) * type.size()]),

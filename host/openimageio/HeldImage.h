@@ -16,7 +16,7 @@ public:
     /// Fills the image with samples of that type, three a pixel.
     using Decode = std::function<void(void* rgb)>;
 
-    HeldImage(int width, int height, OIIO::TypeDesc type, const Decode& decode);
+    HeldImage(int width, int height, const OIIO::TypeDesc& type, const Decode& decode);
 
     const float* line(int line) override;
 

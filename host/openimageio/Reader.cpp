@@ -33,7 +33,9 @@ public:
 
     const ImageFrame& frame() const override { return frame_; }
     const std::string& remark() const override { return chosen_.remark; }
-    std::string sampleType() const override { return nameOf(sampleTypeOf(chosen_.spec, chosen_.channels[0])); }
+    std::string sampleType() const override {
+        return nameOf(sampleTypeOf(chosen_.spec, chosen_.channels[0]));
+    }
 
     const float* line(int line) override {
         try {
