@@ -42,18 +42,23 @@ Range inputRangeOf(const LUT& lut) {
     return range;
 }
 
-void forEachInput(const LUT& lut, bool withHalfWays, const UseColour& use) {
+ChannelInputs inputsAlong(const LUT& lut, int stepsPerCell) {
     const Range range = inputRangeOf(lut);
-    const int steps = withHalfWays ? 2 : 1;
-    const int sides[] = {lut.width(), lut.is1D() ? 1 : lut.height(), lut.is1D() ? 1 : lut.depth()};
-    std::vector<float> inputs[3];
+    const int sides[] = {lut.width(), lut.is1D() ? lut.width() : lut.height(),
+                         lut.is1D() ? lut.width() : lut.depth()};
+    ChannelInputs inputs;
     for (unsigned c = 0; c < 3; ++c) {
-        const int cells = (lut.is1D() ? sides[0] : sides[c]) - 1;
-        for (int i = 0; i <= cells * steps; ++i) {
-            const double position = cells == 0 ? 0.0 : static_cast<double>(i) / (cells * steps);
+        const int steps = (sides[c] - 1) * stepsPerCell;
+        for (int i = 0; i <= steps; ++i) {
+            const double position = steps == 0 ? 0.0 : static_cast<double>(i) / steps;
             inputs[c].push_back(inputAt(lut, range, c, position));
         }
     }
+    return inputs;
+}
+
+void forEachInput(const LUT& lut, bool withHalfWays, const UseColour& use) {
+    const ChannelInputs inputs = inputsAlong(lut, withHalfWays ? 2 : 1);
     if (lut.is1D()) {
         for (std::size_t i = 0; i < inputs[0].size(); ++i)
             use(RGB(inputs[0][i], inputs[1][i], inputs[2][i]));

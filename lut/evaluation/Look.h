@@ -16,9 +16,17 @@ namespace Orlith::LUT {
 /// one, 0 to 1 in front of an output shaper, otherwise those of its points.
 Range inputRangeOf(const LUT& lut);
 
+/// Inputs along red, green and blue.
+using ChannelInputs = std::array<std::vector<float>, 3>;
+
+/// The inputs of a table's points along each channel; behind a pre-LUT, places evenly spaced along
+/// it.
+/// @param stepsPerCell  1: the points alone; 2: the places half-way to the next as well; and so on
+ChannelInputs inputsAlong(const LUT& lut, int stepsPerCell);
+
 using UseColour = std::function<void(const RGB& colour)>;
 
-/// Visits the inputs of a table's points; behind a pre-LUT, points evenly spaced along it.
+/// Visits the colours that inputsAlong spans.
 /// @param withHalfWays  visit the places half-way to the next point as well
 void forEachInput(const LUT& lut, bool withHalfWays, const UseColour& use);
 

@@ -10,7 +10,6 @@
 #include "orlith/Json.h"
 #include "orlith/Options.h"
 #include "orlith/table/ColourOptions.h"
-#include "orlith/table/Facts.h"
 #include "orlith/table/TableFile.h"
 
 namespace orlith {
@@ -32,6 +31,17 @@ constexpr const char* kChannels[] = {"red", "green", "blue"};
 bool sameSize(const ol::LUT& a, const ol::LUT& b) {
     if (a.is1D() || b.is1D()) return a.is1D() && b.is1D() && a.width() == b.width();
     return a.width() == b.width() && a.height() == b.height() && a.depth() == b.depth();
+}
+
+/// The input colour that a place of a table stands for: lattice point (r, g, b), or entry i of a
+/// curve on all three channels.
+ol::RGB inputColour(const ol::LUT& lut, int r, int g, int b) {
+    const int index[] = {r, g, b};
+    ol::RGB colour;
+    for (unsigned c = 0; c < 3; ++c) {
+        colour[c] = static_cast<float>(index[c]) * lut.transform[c][c] + lut.transform[3][c];
+    }
+    return colour;
 }
 
 /// By the book: sample by sample; where sizes differ, at the points of the larger table, where the

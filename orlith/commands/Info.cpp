@@ -4,13 +4,14 @@
 #include <cstdint>
 #include <optional>
 #include <string>
+#include <vector>
 
 #include "lut/evaluation/Look.h"
 #include "orlith/Command.h"
 #include "orlith/Json.h"
 #include "orlith/Messages.h"
-#include "orlith/table/Facts.h"
 #include "orlith/table/TableFile.h"
+#include "report/Report.h"
 
 namespace orlith {
 namespace {
@@ -26,10 +27,10 @@ struct InfoOptions {
     bool showsValues = false;
 };
 
-/// Range and shape of the samples; none where the file did not fill the table, or it has no points.
-std::optional<Facts> facts(const Table& table) {
+/// What there is to see; nothing where the file did not fill the table, or it has no points.
+std::optional<report::Report> look(const Table& table) {
     if (!table.isFilled() || table.pointCount == 0) return std::nullopt;
-    return factsOf(*table.lut);
+    return report::reportOn(table.lut);
 }
 
 // JSON
@@ -70,12 +71,40 @@ std::string jsonRemarks(const Table& table) {
     return "[" + list + "]";
 }
 
+std::string jsonFault(const report::Fault& fault) {
+    constexpr const char* kNames[] = {"red", "green", "blue"};
+    std::string channels;
+    for (unsigned c = 0; c < 3; ++c) {
+        if (!fault.channels[c]) continue;
+        if (!channels.empty()) channels += ", ";
+        channels += jsonText(kNames[c]);
+    }
+    const std::string level = fault.kind == report::FaultKind::Clip
+                                  ? fmt::format("\"level\": {}, ", jsonNumber(fault.level))
+                                  : "";
+    return fmt::format(
+        "{{\"kind\": {}, \"channels\": [{}], \"from\": {}, \"to\": {}, \"amount\": {}, {}"
+        "\"count\": {}, \"text\": {}}}",
+        jsonText(nameOf(fault.kind)), channels, jsonTriple(fault.from.data_block()),
+        jsonTriple(fault.to.data_block()), jsonNumber(static_cast<float>(fault.amount)), level,
+        fault.count, jsonText(textOf(fault)));
+}
+
+std::string jsonFaults(const std::vector<report::Fault>& faults) {
+    std::string list;
+    for (const report::Fault& fault : faults) {
+        if (!list.empty()) list += ",\n  ";
+        list += jsonFault(fault);
+    }
+    return "[" + list + "]";
+}
+
 void printJson(const Table& table, const InfoOptions& options) {
     const ol::LUT& lut = *table.lut;
     ol::RGB min;
     ol::RGB max;
     lut.minmax(min, max);
-    const auto found = facts(table);
+    const auto found = look(table);
     const std::string size =
         lut.is1D() ? fmt::format("[{}]", lut.width())
                    : fmt::format("[{}, {}, {}]", lut.width(), lut.height(), lut.depth());
@@ -86,7 +115,8 @@ void printJson(const Table& table, const InfoOptions& options) {
                jsonRange(min, max));
     fmt::print(" \"inputShaper\": {}, \"outputShaper\": {},\n", jsonShaper(lut.inputShaper),
                jsonShaper(lut.outputShaper));
-    fmt::print(" \"range\": {},\n", found ? jsonRange(found->min, found->max) : "null");
+    fmt::print(" \"range\": {},\n", found ? jsonRange(found->facts.min, found->facts.max) : "null");
+    fmt::print(" \"faults\": {},\n", found ? jsonFaults(found->faults) : "null");
     fmt::print(" \"remarks\": {}", jsonRemarks(table));
     if (options.showsValues) {
         fmt::print(",\n \"values\": [");
@@ -124,12 +154,19 @@ void printText(const Table& table, const InfoOptions& options) {
     line("domain", fmt::format("{} to {}", triple(domain.min), triple(domain.max)));
     printShaper("input shaper", lut.inputShaper);
     printShaper("output shaper", lut.outputShaper);
-    if (const auto found = facts(table)) {
+    if (const auto found = look(table)) {
+        const report::Facts& facts = found->facts;
         const auto yesNo = [](bool yes) { return yes ? "yes" : "no"; };
-        line("range", fmt::format("{} to {}", triple(found->min), triple(found->max)));
-        line("from identity", fmt::format("{:.6g} at most", identityDeviation(table.lut)));
-        line("monotone", fmt::format("red {}, green {}, blue {}", yesNo(found->isMonotone[0]),
-                                     yesNo(found->isMonotone[1]), yesNo(found->isMonotone[2])));
+        line("range", fmt::format("{} to {}", triple(facts.min), triple(facts.max)));
+        line("from identity", fmt::format("{:.6g} at most", found->identityDeviation));
+        line("monotone", fmt::format("red {}, green {}, blue {}", yesNo(facts.isMonotone[0]),
+                                     yesNo(facts.isMonotone[1]), yesNo(facts.isMonotone[2])));
+        if (found->faults.empty()) line("faults", "none found");
+        const char* name = "faults";
+        for (const report::Fault& fault : found->faults) {
+            line(name, textOf(fault));
+            name = "";
+        }
     } else {
         line("range", "unknown: the file does not fill the table");
     }

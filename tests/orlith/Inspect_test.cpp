@@ -22,7 +22,8 @@ TEST_F(InspectTest, InfoTellsAPersonWhatIsInAFile) {
               "domain          0 0 0 to 1 1 1\n"
               "range           0 0 0.25 to 1 1 0.5\n"
               "from identity   1 at most\n"
-              "monotone        red yes, green yes, blue yes\n");
+              "monotone        red yes, green yes, blue yes\n"
+              "faults          neutrals lean to yellow by 0.75 at most, at 1 1 1\n");
     folder_.write("curve", "LUT_1D_SIZE 3\n0 1 nan\n0 0.25 nan\n1 0.5 nan\n");
     EXPECT_EQ(output("info curve --from cube --values --strict"),
               "file            curve\n"
@@ -33,6 +34,8 @@ TEST_F(InspectTest, InfoTellsAPersonWhatIsInAFile) {
               "range           0 0.25 nan to 1 1 nan\n"
               "from identity   inf at most\n"
               "monotone        red yes, green no, blue no\n"
+              "faults          3 samples are not finite, the first at 0 0 0\n"
+              "                green folds back by 0.25 from 0.5 0.5 0.5 to 1 1 1\n"
               "0 1 nan\n"
               "0 0.25 nan\n"
               "1 0.5 nan\n");
@@ -55,6 +58,9 @@ TEST_F(InspectTest, InfoPrintsOneJsonObject) {
         " 1], [1, 1, 1]]}, \"outputShaper\": {\"counts\": [2, 3, 2], \"entries\": [[0, 0, 0],"
         " [0.5, 1e-07, \"nan\"], [0.5, 1, \"nan\"]]},\n"
         " \"range\": {\"min\": [0.1, 0.2, 0.3], \"max\": [0.1, \"inf\", 16777216]},\n"
+        " \"faults\": [{\"kind\": \"not finite\", \"channels\": [\"red\", \"green\"], "
+        "\"from\": [0, 0, \"nan\"], \"to\": [0, 0, \"nan\"], \"amount\": \"inf\", "
+        "\"count\": 1, \"text\": \"1 sample is not finite, at 0 0 nan\"}],\n"
         " \"remarks\": [],\n"
         " \"values\": [[0.1, 0.2, 0.3], [\"nan\", \"inf\", 16777216]]}\n");
 }
@@ -69,7 +75,7 @@ TEST_F(InspectTest, TinyFilesWithHugeClaimsAreAnsweredAtOnce) {
     EXPECT_EQ(json.status, 0);
     EXPECT_EQ(json.err, "orlith: warning: " REASON);
     test::expectIn(json.out, "\"samples_read\": 1,\n");
-    test::expectIn(json.out, "\"range\": null,\n");
+    test::expectIn(json.out, "\"range\": null,\n \"faults\": null,\n");
     expectAll({
         {"info claim.cube --values", 1, "",
          "orlith: warning: " REASON
