@@ -36,6 +36,7 @@ void addInfo(CLI::App& program, int& status);
 void addEval(CLI::App& program, int& status);
 void addDiff(CLI::App& program, int& status);
 void addRun(CLI::App& program, int& status);
+void addView(CLI::App& program, int& status);
 void addPanel(CLI::App& program, int& status);
 
 }  // namespace orlith

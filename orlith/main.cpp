@@ -154,6 +154,7 @@ int main(int argc, char** argv) {
     orlith::addInfo(program, status);
     orlith::addEval(program, status);
     orlith::addDiff(program, status);
+    orlith::addView(program, status);
     orlith::addRun(program, status);
     orlith::addPanel(program, status);
     status = orlith::run(program, argc, argv, status);

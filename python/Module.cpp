@@ -267,8 +267,12 @@ Difference diff(const py::object& a, const py::object& b, const std::string& mod
     const auto method = toMethod(mode);
     const auto lutA = toLUT(a);
     const auto lutB = toLUT(b);
+    const auto lookOf = [&](const boost::shared_ptr<const ol::LUT>& lut) -> ol::ColourWay {
+        return [evaluator = ol::Evaluator(lut, method, toOutside(extrapolates))](
+                   float* rgb, std::size_t count) { evaluator.apply(rgb, rgb, count); };
+    };
     const py::gil_scoped_release others;
-    return {ol::compareLooks(lutA, lutB, method, toOutside(extrapolates))};
+    return {ol::compareLooks(*lutA, lookOf(lutA), *lutB, lookOf(lutB))};
 }
 
 /// A number of each channel, (3,).

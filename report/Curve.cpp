@@ -62,6 +62,7 @@ Curve channelAxis(const ol::LUT& lut, const Look& look, unsigned channel) {
         colour[c] = std::max(std::min(0.0F, domain.max[c]), domain.min[c]);
     const ol::ChannelInputs inputs = inputsAlong(lut, stepsPerCell(lut, channel));
     std::vector<ol::RGB> colours;
+    colours.reserve(inputs[channel].size());
     for (const float input : inputs[channel]) {
         colour[channel] = input;
         colours.push_back(colour);

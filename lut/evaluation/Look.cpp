@@ -142,16 +142,12 @@ Differences LookComparison::finish() {
     return differences_;
 }
 
-Differences compareLooks(const boost::shared_ptr<const LUT>& a,
-                         const boost::shared_ptr<const LUT>& b, Evaluator::Method method,
-                         Evaluator::Outside outside) {
-    const Evaluator evaluatorA(a, method, outside);
-    const Evaluator evaluatorB(b, method, outside);
-    LookComparison comparison(evaluatorA, evaluatorB);
+Differences compareLooks(const LUT& a, ColourWay lookA, const LUT& b, ColourWay lookB) {
+    LookComparison comparison(std::move(lookA), std::move(lookB));
     const auto add = [&](const RGB& colour) { comparison.add(colour); };
-    forEachInput(pointCount(*a) >= pointCount(*b) ? *a : *b, false, add);
-    forEachRandom(inputRangeOf(*a), kRandomColours / 2, add);
-    forEachRandom(inputRangeOf(*b), kRandomColours / 2, add);
+    forEachInput(pointCount(a) >= pointCount(b) ? a : b, false, add);
+    forEachRandom(inputRangeOf(a), kRandomColours / 2, add);
+    forEachRandom(inputRangeOf(b), kRandomColours / 2, add);
     return comparison.finish();
 }
 

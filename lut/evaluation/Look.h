@@ -1,7 +1,6 @@
 #pragma once
 
 #include <array>
-#include <boost/smart_ptr/shared_ptr.hpp>
 #include <cstddef>
 #include <cstdint>
 #include <functional>
@@ -74,10 +73,9 @@ private:
     Differences differences_;
 };
 
-/// How far two looks are apart: at the points of the larger table, and at random colours of both.
-Differences compareLooks(const boost::shared_ptr<const LUT>& a,
-                         const boost::shared_ptr<const LUT>& b, Evaluator::Method method,
-                         Evaluator::Outside outside);
+/// How far two tables are apart as people see them: at the points of the larger one and at 10,000
+/// random colours, half of them of each table's domain.
+Differences compareLooks(const LUT& a, ColourWay lookA, const LUT& b, ColourWay lookB);
 
 /// Adds two results of a channel to its difference; mean and square are sums until the end.
 void addDifference(Difference& difference, float a, float b, const RGB& at);

@@ -105,7 +105,8 @@ int runDiff(const DiffOptions& options) {
     const ol::Differences differences =
         options.reading.isStrict
             ? compareSamples(a, b)
-            : ol::compareLooks(a.lut, b.lut, options.colours.method, options.colours.outside());
+            : ol::compareLooks(*a.lut, wayThrough(a.lut, options.colours, false), *b.lut,
+                               wayThrough(b.lut, options.colours, false));
     const bool isWithin = largestOf(differences) <= options.tolerance;
     if (options.isJson) {
         printJson(differences, isWithin);

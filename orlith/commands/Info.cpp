@@ -6,8 +6,8 @@
 #include <string>
 #include <vector>
 
-#include "lut/evaluation/Look.h"
 #include "orlith/Command.h"
+#include "orlith/FactsInWords.h"
 #include "orlith/Json.h"
 #include "orlith/Messages.h"
 #include "orlith/table/TableFile.h"
@@ -130,49 +130,24 @@ void printJson(const Table& table, const InfoOptions& options) {
 
 // For a person
 
-std::string triple(const ol::RGB& rgb) {
-    return colourText(rgb.data_block());
-}
-
-void printShaper(const char* name, const ol::Shaper& shaper) {
-    if (shaper.empty()) return;
-    fmt::print("{:<16}{} entries, counts {}, from {} to {}\n", name, shaper.entries.size(),
-               triple(shaper.counts), triple(shaper.entries.front()),
-               triple(shaper.entries.back()));
-}
-
 void printText(const Table& table, const InfoOptions& options) {
-    const ol::LUT& lut = *table.lut;
-    const ol::Range domain = inputRangeOf(lut);
-    const auto line = [](const char* name, const std::string& value) {
+    const auto line = [](const std::string& name, const std::string& value) {
         fmt::print("{:<16}{}\n", name, value);
     };
-    line("file", printable(table.name));
-    line("format", table.extension);
-    line("table", fmt::format("{}, {}", lut.is1D() ? "1D" : "3D", sizeText(lut)));
-    line("samples read", fmt::format("{}", table.samplesRead));
-    line("domain", fmt::format("{} to {}", triple(domain.min), triple(domain.max)));
-    printShaper("input shaper", lut.inputShaper);
-    printShaper("output shaper", lut.outputShaper);
-    if (const auto found = look(table)) {
-        const report::Facts& facts = found->facts;
-        const auto yesNo = [](bool yes) { return yes ? "yes" : "no"; };
-        line("range", fmt::format("{} to {}", triple(facts.min), triple(facts.max)));
-        line("from identity", fmt::format("{:.6g} at most", found->identityDeviation));
-        line("monotone", fmt::format("red {}, green {}, blue {}", yesNo(facts.isMonotone[0]),
-                                     yesNo(facts.isMonotone[1]), yesNo(facts.isMonotone[2])));
+    const auto found = look(table);
+    for (const auto& [name, value] : factsInWords(table, found ? &*found : nullptr))
+        line(name, value);
+    if (found) {
         if (found->faults.empty()) line("faults", "none found");
         const char* name = "faults";
         for (const report::Fault& fault : found->faults) {
             line(name, textOf(fault));
             name = "";
         }
-    } else {
-        line("range", "unknown: the file does not fill the table");
     }
     if (!options.showsValues) return;
     for (std::uint64_t i = 0; i < table.pointCount; ++i) {
-        fmt::print("{}\n", colourText(lut.data() + 3 * i));
+        fmt::print("{}\n", colourText(table.lut->data() + 3 * i));
     }
 }
 

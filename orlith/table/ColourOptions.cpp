@@ -21,12 +21,6 @@ ol::Evaluator ColourOptions::evaluator(const boost::shared_ptr<const ol::LUT>& t
     return ol::Evaluator(table, method, outside());
 }
 
-ol::ColourWay ColourOptions::look(const boost::shared_ptr<const ol::LUT>& table) const {
-    return [evaluator = evaluator(table)](float* rgb, std::size_t count) {
-        evaluator.apply(rgb, rgb, count);
-    };
-}
-
 ol::InterpolationMode ColourOptions::bookMode() const {
     switch (method) {
         case Method::Step:

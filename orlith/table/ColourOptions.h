@@ -16,9 +16,6 @@ struct ColourOptions {
     Orlith::LUT::Evaluator::Outside outside() const;
     Orlith::LUT::Evaluator evaluator(const boost::shared_ptr<const Orlith::LUT::LUT>& table) const;
 
-    /// Such an evaluator as a function.
-    Orlith::LUT::ColourWay look(const boost::shared_ptr<const Orlith::LUT::LUT>& table) const;
-
     /// The library's own mode of that name.
     /// @throws UsageError  it has none: tetrahedral
     Orlith::LUT::InterpolationMode bookMode() const;

@@ -55,7 +55,7 @@ TEST_F(GenerateTest, RecordsALookInEveryFormat) {
                    each.summary + "\n",
                each.warning);
         const std::string values = output("info --values " + name);
-        std::size_t line = values.find("\nmonotone");
+        std::size_t line = values.find("\nfaults");
         for (int i = 0; i < 1 + 1 + 5 * 2 + 25 * 3; ++i)
             line = values.find('\n', line + 1);
         EXPECT_EQ(values.substr(line + 1, values.find('\n', line + 1) - line - 1), each.sample)

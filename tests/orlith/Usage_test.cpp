@@ -26,7 +26,7 @@ TEST_F(UsageTest, HelpAndManPageHaveEveryCommandAndOption) {
     const std::string overview = output("--help");
     std::set<std::string> offered = longOptions(overview);
     for (const std::string command : {"pattern", "generate", "bake", "apply", "convert", "info",
-                                      "eval", "diff", "run", "panel"}) {
+                                      "eval", "diff", "view", "run", "panel"}) {
         test::expectIn(overview, "\n  " + command + " ");
         test::expectIn(manual, "\n.SS " + command + "\n");
         const std::string help = output(command + " --help");
@@ -61,6 +61,8 @@ TEST_F(UsageTest, WrongUsageIsOneLineAndStatusTwo) {
         {"convert a.cube b.3dl --scale nan", "\"nan\" has to be a number"},
         {"eval - --from cube", "cannot both come from standard input"},
         {"diff - - --from cube", "only one of the tables"},
+        {"view - - --from cube", "only one of the tables"},
+        {"view a.cube b.cube c.cube", "c.cube"},
         {"info a.3dl --read-output-bitdepth 32",
          "has to be detect, input or a number of bits from 1 to 31"},
         {"apply a.exr b.exr", "--lut is required"},
