@@ -14,7 +14,7 @@ say = @printf '\n== %s\n' "$(1)"
 .DEFAULT_GOAL := help
 
 help:
-	@echo "make demo      build, make a look-up table from a test pattern, and show it"
+	@echo "make demo      build, bake a look-up table, put it on an image, and show files"
 	@echo "make test      build and run every test"
 	@echo "make bench     build and run the benchmarks"
 	@echo "make fuzz      run each fuzz target for FUZZ_SECONDS ($(FUZZ_SECONDS))"
@@ -59,7 +59,11 @@ demo: build
 	@mkdir -p $(DEMO)
 	$(call say,the look of an image program as a look-up table)
 	$(ORLITH) bake $(DEMO)/baked.cube -- oiiotool {in} --powc 0.45 --mulc 0.9,1,0.8 -o {out}
-	$(call say,the same in steps: a 33-point test pattern)
+	$(call say,that table on an image)
+	oiiotool --pattern fill:topleft=0.02,0.05,0.3:topright=0.5,0.7,1:bottomleft=0.2,0.1,0.05:bottomright=1,0.6,0.2 \
+	    640x360 3 -d half -o $(DEMO)/plate.exr
+	$(ORLITH) apply $(DEMO)/plate.exr $(DEMO)/plate-graded.exr --lut $(DEMO)/baked.cube --mode tetrahedral
+	$(call say,the same look in steps: a 33-point test pattern)
 	$(ORLITH) pattern $(DEMO)/pattern.exr --size 33
 	$(call say,graded by an image program)
 	oiiotool $(DEMO)/pattern.exr --powc 0.45 --mulc 0.9,1,0.8 -o $(DEMO)/graded.exr
