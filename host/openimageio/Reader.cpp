@@ -91,7 +91,7 @@ private:
     /// Has channels read so that triples of red, green and blue come out.
     /// @param read  reads channels first to end - 1 to where the first pixel's are
     template <typename Read>
-    void readChannels(OIIO::TypeDesc type, void* rgb, const Read& read) {
+    void readChannels(const OIIO::TypeDesc& type, void* rgb, const Read& read) {
         const auto [red, green, blue] = chosen_.channels;
         const bool isTogether = green == red + 1 && blue == red + 2;
         for (std::size_t i = 0; i < chosen_.channels.size(); i += isTogether ? 3 : 1) {
