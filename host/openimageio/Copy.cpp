@@ -120,11 +120,13 @@ private:
     void write(const OIIO::ImageSpec& spec, int line, int end, const std::byte* pixels) const {
         const int top = spec.y + line;
         const int bottom = spec.y + end;
-        output_.expectWritten(
-            spec.tile_width == 0
-                ? output_->write_scanlines(top, bottom, spec.z, OIIO::TypeUnknown, pixels)
-                : output_->write_tiles(spec.x, spec.x + spec.width, top, bottom, spec.z, spec.z + 1,
-                                       OIIO::TypeUnknown, pixels));
+        // By its name where it has one: formats that convert what they are given, or fill tiles at
+        // the edges, do not know what "as it is" means.
+        const OIIO::TypeDesc type = spec.channelformats.empty() ? spec.format : OIIO::TypeUnknown;
+        output_.expectWritten(spec.tile_width == 0
+                                  ? output_->write_scanlines(top, bottom, spec.z, type, pixels)
+                                  : output_->write_tiles(spec.x, spec.x + spec.width, top, bottom,
+                                                         spec.z, spec.z + 1, type, pixels));
     }
 
     CopiedImage report() const {

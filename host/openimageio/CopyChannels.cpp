@@ -67,18 +67,19 @@ void tellLostPrecision(const PlannedImage& image, const std::vector<SampleType>&
 
 }  // namespace
 
-void planChannels(PlannedImage& image, CopyTarget& target) {
+void planChannels(PlannedImage& image, CopyTarget& target, bool keepsOrder) {
     const OIIO::ImageSpec& from = image.from;
     image.alpha = image.isChanged ? alphaOf(from, image.rgb) : from.alpha_channel;
     std::vector<int>& channels = image.channels;
-    if (image.isChanged && !target.holdsNamedChannels()) {
+    const bool isLimited = !target.supports("nchannels");
+    if (image.isChanged && !target.holdsNamedChannels() && (isLimited || !keepsOrder)) {
         channels.assign(image.rgb.begin(), image.rgb.end());
         if (image.alpha >= 0) channels.push_back(image.alpha);
     }
     for (int channel = 0; channel < from.nchannels; ++channel) {
         if (placeOf(channel, channels) < 0) channels.push_back(channel);
     }
-    if (!target.supports("nchannels")) {
+    if (isLimited) {
         const std::size_t most = target.supports("alpha") && image.alpha >= 0 ? 4 : 3;
         channels.resize(std::min(channels.size(), most));
         tellLostChannels(image, target);

@@ -71,7 +71,8 @@ PlannedImage planImage(OIIO::ImageInput& input, int part, const ChosenImage& cho
     image.to = image.from;
     image.isChanged = part == chosen.part;
     if (image.isChanged) image.rgb = chosen.channels;
-    planChannels(image, target);
+    const bool keepsOrder = std::string_view(input.format_name()) == target.formatName();
+    planChannels(image, target, keepsOrder);
     planTypes(image, target);
     placeWindow(image.to, target);
     placeAlpha(image, target);

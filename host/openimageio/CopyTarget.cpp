@@ -1,6 +1,7 @@
 #include "host/openimageio/CopyTarget.h"
 
 #include <algorithm>
+#include <string_view>
 
 namespace host::openimageio {
 
@@ -10,6 +11,14 @@ CopyTarget::CopyTarget(const OIIO::ImageOutput& format, std::string path,
     if (sampleType.empty()) return;
     wantedType_ = namedSampleType(sampleType);
     expectFormatHolds(path_, *wantedType_);
+}
+
+bool CopyTarget::supports(const char* feature) const {
+    // The elements of a DPX file share one size and one set of channels: colours, and alpha.
+    const std::string_view name = feature;
+    const bool isOfOthers = name == "multiimage" || name == "nchannels";
+    if (isOfOthers && std::string_view(formatName()) == "dpx") return false;
+    return format_.supports(feature) != 0;
 }
 
 SampleType CopyTarget::heldType(const SampleType& type) {

@@ -21,7 +21,7 @@ public:
     const char* formatName() const { return format_.format_name(); }
 
     /// Whether the format has a feature, of the library's list.
-    bool supports(const char* feature) const { return format_.supports(feature) != 0; }
+    bool supports(const char* feature) const;
 
     /// Whether channels have names and types of their own.
     bool holdsNamedChannels() const { return supports("channelformats"); }

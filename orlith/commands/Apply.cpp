@@ -1,6 +1,10 @@
 #include <fmt/format.h>
 
 #include <algorithm>
+#include <atomic>
+#include <cstdint>
+#include <filesystem>
+#include <memory>
 #include <optional>
 #include <set>
 #include <string>
@@ -10,6 +14,7 @@
 #include "host/ImageChecks.h"
 #include "host/ImageCodec.h"
 #include "host/ProgressDisplay.h"
+#include "lut/evaluation/Look.h"
 #include "orlith/Command.h"
 #include "orlith/Frames.h"
 #include "orlith/ImageOptions.h"
@@ -42,7 +47,14 @@ void expectUsable(const ApplyOptions& options) {
     if (std::count(options.tables.begin(), options.tables.end(), "-") > 1) {
         throw UsageError("only one of the tables can come from standard input");
     }
-    if (!options.frames) return;
+    if (!options.frames) {
+        std::error_code ignored;
+        if (hasFrameNumber(options.image) && !std::filesystem::exists(options.image, ignored)) {
+            throw UsageError(
+                fmt::format("{}: --frames says which frames, such as 1-100", options.image));
+        }
+        return;
+    }
     for (const std::string& pattern : {options.image, options.output}) {
         if (!hasFrameNumber(pattern)) {
             throw UsageError(fmt::format(
@@ -52,24 +64,45 @@ void expectUsable(const ApplyOptions& options) {
     }
 }
 
-/// The way through all tables, one after the other.
-ColourWay readTables(const ApplyOptions& options) {
-    std::vector<ColourWay> ways;
+/// A table, and the colours that have come to it from outside its domain since it was last asked.
+struct AppliedTable {
+    std::string name;
+    ColourWay way;
+    Orlith::LUT::Range inputs;
+    std::atomic<std::uint64_t> outsideCount{0};  // added to by all threads
+
+    void apply(float* rgb, std::size_t colourCount) {
+        std::uint64_t outside = 0;
+        for (const float* each = rgb; each != rgb + 3 * colourCount; each += 3) {
+            bool isInside = true;  // NaN is not
+            for (unsigned c = 0; c < 3; ++c)
+                isInside = isInside & (inputs.min[c] <= each[c]) & (each[c] <= inputs.max[c]);
+            outside += isInside ? 0 : 1;
+        }
+        outsideCount += outside;
+        way(rgb, colourCount);
+    }
+};
+
+/// The tables in their order.
+std::vector<std::unique_ptr<AppliedTable>> readTables(const ApplyOptions& options) {
+    std::vector<std::unique_ptr<AppliedTable>> tables;
     for (const std::string& path : options.tables) {
         const Table table = readTableForColours(path, readingAmong(path, options.reading));
-        ways.push_back(wayThrough(table.lut, options.colours, options.reading.isStrict));
+        tables.push_back(std::make_unique<AppliedTable>());
+        AppliedTable& applied = *tables.back();
+        applied.name = table.name;
+        applied.way = wayThrough(table.lut, options.colours, options.reading.isStrict);
+        applied.inputs = inputRangeOf(*table.lut);
     }
-    return [ways](float* rgb, std::size_t colourCount) {
-        for (const ColourWay& each : ways)
-            each(rgb, colourCount);
-    };
+    return tables;
 }
 
 /// Sends images through the tables, with one bar for all of them.
 class Application {
 public:
     explicit Application(const ApplyOptions& options)
-        : options_(options), change_(readTables(options)) {}
+        : options_(options), tables_(readTables(options)) {}
 
     int run() {
         if (options_.frames) {
@@ -102,7 +135,10 @@ private:
         copy.choice = options_.choice;
         copy.sampleType = options_.sampleType;
         copy.threadCount = options_.threadCount;
-        copy.change = change_;
+        copy.change = [this](float* rgb, std::size_t colourCount) {
+            for (const auto& each : tables_)
+                each->apply(rgb, colourCount);
+        };
         copy.progress = [&](double done) {
             output.expectNotCancelled();
             progress_.fraction((static_cast<double>(imagesDone_) + done) /
@@ -129,10 +165,28 @@ private:
         }
         for (const std::string& loss : copied.losses)
             warnOnce(output.name(), loss);
+        warnOfColoursOutside(image, copied);
         if (options_.isQuiet) return;
         progress_.clear();
         output.print(fmt::format("{}: {} x {} pixels, {}\n", printable(output.name()), copied.width,
                                  copied.height, copied.sampleType));
+    }
+
+    /// Colours that a table does not tell from those at its edge: a loss, though the usual one.
+    void warnOfColoursOutside(const std::string& image, const host::CopiedImage& copied) {
+        for (const auto& each : tables_) {
+            const std::uint64_t count = each->outsideCount.exchange(0);
+            const bool isHeld = !options_.reading.isStrict && !options_.colours.extrapolates;
+            if (count == 0 || !isHeld || !clampedTables_.insert(each.get()).second) continue;
+            progress_.clear();
+            const double all = static_cast<double>(copied.width) * copied.height;
+            warn(fmt::format(
+                "{}: {:.3g} % of its colours are outside the domain of {}, {} to {}, and"
+                " held at its edge (--extrapolate goes on in straight lines)",
+                image, 100.0 * static_cast<double>(count) / all, each->name,
+                colourText(each->inputs.min.data_block()),
+                colourText(each->inputs.max.data_block())));
+        }
     }
 
     /// The frames of a sequence are alike: what is said of one is not said of the others again.
@@ -143,11 +197,12 @@ private:
     }
 
     const ApplyOptions& options_;
-    const ColourWay change_;
+    const std::vector<std::unique_ptr<AppliedTable>> tables_;
     host::ProgressDisplay progress_;
     std::int64_t imageCount_ = 1;
     std::int64_t imagesDone_ = 0;
-    std::set<std::string> warnings_;  // that were given
+    std::set<std::string> warnings_;               // that were given
+    std::set<const AppliedTable*> clampedTables_;  // that were warned of
 };
 
 int runApply(const ApplyOptions& options) {

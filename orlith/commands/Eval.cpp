@@ -56,7 +56,7 @@ bool addColour(std::string_view line, std::vector<float>& colours) {
 
 /// Takes colours together as long as more are waiting; whoever waits for an answer gets it at once.
 void evaluateInput(const ColourWay& way) {
-    constexpr std::size_t kMostFloats = 3 * 4096;
+    constexpr std::size_t kMostFloats = std::size_t{3} * 4096;
     std::ios::sync_with_stdio(false);  // so that the stream knows what is waiting
     std::vector<float> colours;
     std::string line;

@@ -8,6 +8,7 @@
 
 #include "lut/Exception.h"
 #include "lut/io/Registry.h"
+#include "lut/io/table/Proof.h"
 #include "lut/io/table/FileError.h"
 #include "orlith/Command.h"
 #include "orlith/Messages.h"
@@ -149,6 +150,8 @@ Table readWholeTable(const std::string& path, const ReadOptions& options) {
     if (!table.isFilled()) throw Failure(fmt::format("{}: {}", table.name, sampleCounts(table)));
     warnOfRemarks(table.name, table.remarks);
     warnOfSurplus(table);
+    // It would hold colours outside at its ends.
+    if (!options.isStrict) ol::dropIdentityPreLUT(*table.lut);
     return table;
 }
 
