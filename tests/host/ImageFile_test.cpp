@@ -145,6 +145,7 @@ TEST_F(ImageFileTest, GivesRowsInAnyOrderHoweverTheFileIsLaidOut) {
         return static_cast<float>((column % 5 + 7 * line + 2 * channel) % 512);
     };
     std::vector<float> samples;
+    samples.reserve(std::size_t{3} * kWidth * kHeight);
     for (int i = 0; i < 3 * kWidth * kHeight; ++i)
         samples.push_back(value(i / 3 % kWidth, i / 3 / kWidth, i % 3));
 

@@ -69,7 +69,7 @@ class ApplyTest : public test::ProgramTest {
 protected:
     ApplyTest() : look_(boost::make_shared<ol::LUT3D>()) {
         look_->resize(3);
-        for (std::size_t i = 0; i < 3 * 27; ++i)
+        for (std::size_t i = 0; i < std::size_t{3} * 27; ++i)
             look_->data()[i] = static_cast<float>(i * 11 % 17) / 16.0F;
         ol::setUnitDomain(*look_, 3, 3, 3);
         const std::string path = folder_.path("look.cube");
@@ -206,7 +206,7 @@ TEST_F(ApplyTest, ChangesColoursAndKeepsTheRest) {
         write(each.name, {each.spec});
         const std::string name = each.name;
         const Picture before(folder_.path(name));
-        output("apply " + name + " out-" + name + " --lut look.cube --threads 3 --quiet");
+        output(fmt::format("apply {0} out-{0} --lut look.cube --threads 3 --quiet", name));
         const Picture after(folder_.path("out-" + name));
         const std::array<int, 3> rgb = {0, 1, 2};  // of an EXR file as well, when it is read
         expectLook(before, after, rgb, rgb);
