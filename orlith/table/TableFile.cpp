@@ -8,8 +8,8 @@
 
 #include "lut/Exception.h"
 #include "lut/io/Registry.h"
-#include "lut/io/table/Proof.h"
 #include "lut/io/table/FileError.h"
+#include "lut/io/table/Proof.h"
 #include "orlith/Command.h"
 #include "orlith/Messages.h"
 #include "orlith/Options.h"
