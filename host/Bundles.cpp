@@ -42,7 +42,7 @@ void Bundle::Close::operator()(void* handle) const {
 }
 
 std::string bundleFolderOfProgram() {
-    return (programPath().parent_path().parent_path() / "lib" / "orlith").string();
+    return (programPath().parent_path().parent_path() / ORLITH_BUNDLE_FOLDER).string();
 }
 
 std::vector<std::string> bundlesIn(const std::string& folder) {

@@ -19,7 +19,8 @@ private:
     std::unique_ptr<void, Close> handle_;
 };
 
-/// The folder of operators that goes with the running program: lib/orlith beside its bin.
+/// The folder of operators that goes with the running program: orlith in the library folder (lib,
+/// or what the system has) beside its bin.
 std::string bundleFolderOfProgram();
 
 /// Paths of the bundles in a folder, sorted.

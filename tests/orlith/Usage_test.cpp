@@ -1,4 +1,6 @@
+#include <cstdio>
 #include <cstdlib>
+#include <map>
 #include <regex>
 #include <set>
 
@@ -8,12 +10,39 @@ namespace {
 
 using UsageTest = test::ProgramTest;
 
-std::set<std::string> longOptions(const std::string& text) {
-    const std::regex option("--[a-z][a-z0-9-]*");
+std::set<std::string> all(const std::string& text, const std::regex& what) {
     std::set<std::string> found;
-    for (std::sregex_iterator each(text.begin(), text.end(), option), end; each != end; ++each)
-        found.insert(each->str());
+    for (std::sregex_iterator each(text.begin(), text.end(), what), end; each != end; ++each)
+        found.insert(each->str(1));
     return found;
+}
+
+std::set<std::string> longOptions(const std::string& text) {
+    return all(text, std::regex("(--[a-z][a-z0-9-]*)"));
+}
+
+std::set<std::string> words(const std::string& text) {
+    return all(text, std::regex("([^ ,|\\n]+)"));
+}
+
+/// The values of options that have a menu.
+/// @param menu  matches an option and its values
+std::map<std::string, std::set<std::string>> menus(const std::string& text,
+                                                   const std::regex& menu) {
+    std::map<std::string, std::set<std::string>> found;
+    for (std::sregex_iterator each(text.begin(), text.end(), menu), end; each != end; ++each)
+        found[each->str(1)] = words(each->str(2));
+    return found;
+}
+
+/// What a script of ours prints, run by its shell.
+std::string shellOutput(const std::string& command) {
+    FILE* const pipe = popen(command.c_str(), "r");
+    std::string text;
+    for (int byte = 0; pipe != nullptr && (byte = std::fgetc(pipe)) != EOF;)
+        text.push_back(static_cast<char>(byte));
+    EXPECT_EQ(pipe == nullptr ? -1 : pclose(pipe), 0) << command;
+    return text;
 }
 
 TEST_F(UsageTest, HelpAndManPageHaveEveryCommandAndOption) {
@@ -34,6 +63,62 @@ TEST_F(UsageTest, HelpAndManPageHaveEveryCommandAndOption) {
         offered.merge(longOptions(help));
     }
     EXPECT_EQ(longOptions(manual), offered);
+}
+
+TEST_F(UsageTest, CompletionOffersEveryCommandOptionAndMenu) {
+    for (const char* const file : {"look.CUBE", "look.exr", "look.tcl", "look.txt"})
+        folder_.write(file, "");
+    const auto bash = [&](const std::string& line) {
+        return words(shellOutput("cd '" + folder_.path("") +
+                                 "' && bash '" ORLITH_TEST_COMPLETION
+                                 "/offers.bash' '" ORLITH_COMPLETION "/orlith.bash' orlith " +
+                                 line));
+    };
+    const auto zsh = [](const std::string& command) {
+        return shellOutput("zsh -f '" ORLITH_TEST_COMPLETION "/offers.zsh' '" ORLITH_COMPLETION
+                           "/_orlith' " +
+                           command);
+    };
+    const std::regex helpMenu(R"((--[a-z0-9-]+) [A-Z]*:\{?([a-z0-9,|]+))");
+    const std::regex zshMenu(R"((--[a-z0-9-]+)=?\[[^\]]*\]:[^:]*:\(([^)]*)\))");
+
+    const std::string overview = output("--help");
+    std::set<std::string> commands =
+        all(overview.substr(overview.find("Subcommands:")), std::regex("\n  ([a-z]+) "));
+    EXPECT_EQ(all(zsh(""), std::regex("([a-z]+):.*\n")), commands);
+    for (const std::string& command : commands) {
+        const std::string help = output(command + " --help");
+        const std::string told = zsh(command);
+        std::set<std::string> options = longOptions(help);
+        EXPECT_EQ(longOptions(told), options) << command;
+        options.insert("-h");
+        EXPECT_EQ(bash(command + " -"), options) << command;
+        auto zshMenus = menus(told, zshMenu);
+        for (const auto& [option, values] : menus(help, helpMenu)) {
+            std::string line = command;
+            line.append(" ").append(option);
+            EXPECT_EQ(zshMenus[option], values) << line;
+            EXPECT_EQ(bash(line + " ''"), values) << line;
+        }
+    }
+
+    commands.merge(std::set<std::string>{"-h", "--help", "--version"});
+    const struct {
+        const char* line;
+        std::set<std::string> offered;
+    } kCases[] = {
+        {"''", commands},
+        {"con", {"convert"}},
+        {"pattern l", {"look.exr"}},
+        {"generate look.exr l", {"look.CUBE", "look.exr"}},
+        {"info --from cub", {"cub", "cube"}},
+        {"diff look.CUBE ''", {"look.CUBE"}},
+        {"run ''", {"look.tcl"}},
+        {"run look.tcl --press ''", {}},
+        {"panel ''", {}},
+    };
+    for (const auto& each : kCases)
+        EXPECT_EQ(bash(each.line), each.offered) << each.line;
 }
 
 TEST_F(UsageTest, WrongUsageIsOneLineAndStatusTwo) {
