@@ -6,11 +6,13 @@ FUZZ_SECONDS ?= 60
 PREFIX ?= /usr/local
 
 BUILD := build/$(PRESET)
+PACKAGES := build/package
 SUDO := $(if $(filter 0,$(shell id -u)),,sudo)
 OUR_SOURCES = $(shell git ls-files '*.cpp' '*.h')
 say = @printf '\n== %s\n' "$(1)"
 
-.PHONY: help demo test build bench fuzz asan format lint install packages packages-develop
+.PHONY: help demo test build bench fuzz asan format lint install package \
+    package-check packages packages-develop
 .DEFAULT_GOAL := help
 
 help:
@@ -21,6 +23,8 @@ help:
 	@echo "make asan      all tests under the address and undefined-behaviour sanitizers"
 	@echo "make lint      check format and code;  make format: put the format right"
 	@echo "make install   install under PREFIX ($(PREFIX))"
+	@echo "make package   Debian packages in $(PACKAGES), looked over by lintian"
+	@echo "make package-check   the packages, and a bare Debian 12 that uses them (as root; minutes)"
 
 # Installs the packages of a group that are missing; quick when none is.
 define install_packages
@@ -105,3 +109,17 @@ lint: packages-develop
 
 install: build
 	cmake --install $(BUILD) --prefix $(PREFIX)
+
+# Dated by the last commit, so that the same source gives the same documents.
+package: packages-develop
+	$(call say,building packages ($(PACKAGES)))
+	@export SOURCE_DATE_EPOCH=$$(git log -1 --format=%ct) && cmake --preset package
+	@cmake --build $(PACKAGES)
+	@rm -f $(PACKAGES)/*.deb
+	@cd $(PACKAGES) && cpack
+	$(call say,checking packages)
+	@lintian --fail-on error --suppress-tags initial-upload-closes-no-bugs $(PACKAGES)/*.deb
+
+package-check: package
+	$(call say,using the packages in a bare Debian)
+	@$(SUDO) packaging/check $(PACKAGES)
