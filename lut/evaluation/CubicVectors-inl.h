@@ -26,12 +26,14 @@ struct Powers {
 HWY_INLINE V CatmullRom(V p0, V p1, V p2, V p3, const Powers& power) {
     const auto times = [](float factor, V v)
                            HWY_ATTR { return hn::Mul(hn::Set(Floats(), factor), v); };
+    // What is doubled is so without rounding: one operation for two, unless it overflows.
+    const auto addTwice = [](V sum, V v)
+                              HWY_ATTR { return hn::MulAdd(hn::Set(Floats(), 2.0F), v, sum); };
     const V cubic = hn::Add(hn::Sub(hn::Sub(times(3.0F, p1), times(3.0F, p2)), p0), p3);
-    const V square =
-        hn::Sub(hn::Sub(hn::Add(times(4.0F, p2), times(2.0F, p0)), times(5.0F, p1)), p3);
+    const V square = hn::Sub(hn::Sub(addTwice(times(4.0F, p2), p0), times(5.0F, p1)), p3);
     const V linear = hn::Sub(p2, p0);
     const V curved = hn::Add(hn::Mul(cubic, power.t3), hn::Mul(square, power.t2));
-    return times(0.5F, hn::Add(hn::Add(curved, hn::Mul(linear, power.t)), times(2.0F, p1)));
+    return times(0.5F, addTwice(hn::Add(curved, hn::Mul(linear, power.t)), p1));
 }
 
 void cubic(const PaddedLattice& lattice, const Placement& placement, const float* points,

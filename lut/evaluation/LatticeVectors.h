@@ -20,6 +20,10 @@ using LatticeVectorMethod = void (*)(const PaddedLattice& lattice, const Placeme
 /// of nearest samples.
 using LatticeVectors = std::array<LatticeVectorMethod, 5>;
 
+/// Samples beyond this, and what is no number, are not for the cubic method in vectors: it skips
+/// roundings that only a number near the greatest one shows.
+constexpr float kMostForCubicVectors = 1e36F;
+
 /// The methods in vectors of this processor, or null when it has none that are worth it.
 const LatticeVectors* latticeVectors();
 

@@ -1,6 +1,7 @@
 #include "lut/evaluation/PreparedTable.h"
 
 #include <algorithm>
+#include <cmath>
 #include <new>
 #include <optional>
 
@@ -151,10 +152,17 @@ private:
     CurvePlacement placement_;
 };
 
+bool suitsCubicVectors(const LUT& table) {
+    const float* const end = table.data() + table.dataSize() / sizeof(float);
+    return std::all_of(table.data(), end,
+                       [](float sample) { return std::fabs(sample) <= kMostForCubicVectors; });
+}
+
 std::unique_ptr<const PreparedTable> prepareLattice(const LUT& table, PreLUT preLUT, Method method,
                                                     Outside outside) {
     const Lattice lattice(table);
     if (PaddedLattice::floatCount(lattice) > PaddedLattice::kMostFloats) return nullptr;
+    if (method == Method::Cubic && !suitsCubicVectors(table)) return nullptr;
     return std::make_unique<PreparedLattice>(table, std::move(preLUT), lattice, method, outside);
 }
 

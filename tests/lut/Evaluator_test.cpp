@@ -120,10 +120,11 @@ constexpr Domain kDomains[] = {
     {"behind shapers", {6, 5, 7}, {1 / 5.0F, 1 / 4.0F, 1 / 6.0F}, {0, 0, 0}, true},
 };
 
-/// What stands in a table: random numbers; some of them none, or at the ends of what there is; only
-/// zeros, with their sign.
-enum class Samples { Random, Odd, NegativeZeros };
-constexpr Samples kSamples[] = {Samples::Random, Samples::Odd, Samples::NegativeZeros};
+/// What stands in a table: random numbers; some of them none, or at the ends of what there is;
+/// numbers whose double or sum may be beyond it; only zeros, with their sign.
+enum class Samples { Random, Odd, Huge, NegativeZeros };
+constexpr Samples kSamples[] = {Samples::Random, Samples::Odd, Samples::Huge,
+                                Samples::NegativeZeros};
 
 void fill(ol::LUT& lut, Samples samples) {
     constexpr float kOdd[] = {kNaN, kInfinity, -0.0F, 1e-41F, -3e38F};
@@ -131,6 +132,9 @@ void fill(ol::LUT& lut, Samples samples) {
     std::uniform_real_distribution<float> value(-1.0F, 1.0F);
     for (std::size_t i = 0; i < lut.dataSize() / sizeof(float); ++i) {
         lut.data()[i] = samples == Samples::NegativeZeros ? -0.0F : value(random);
+        if (samples == Samples::Huge) {
+            lut.data()[i] = i % 97 == 0 ? 1.8e38F : random() % 2 == 0 ? 2e37F : -3e37F;
+        }
         if (samples == Samples::Odd && i % 11 == 0) lut.data()[i] = kOdd[i % std::size(kOdd)];
     }
 }
