@@ -5,6 +5,7 @@
 #include <algorithm>
 #include <fstream>
 #include <iterator>
+#include <string_view>
 
 #include "host/Error.h"
 #include "host/openimageio/Codec.h"
@@ -16,14 +17,19 @@ namespace {
     fail(path, reason, "is damaged or cut off");
 }
 
-/// JPEG alone is decoded to a picture of any length: what is missing comes out grey. A whole file
-/// has its end marker, which coded data never contain, at its end or a little before.
-bool isWholeJPEG(const std::string& path) {
+/// JPEG is decoded to a picture of any length: what is missing comes out grey. PNG may lack what
+/// stands behind its pixels. A whole file has its end marker, which coded data never contain, at
+/// its end or a little before.
+bool hasEnd(const std::string& path, std::string_view format) {
+    const std::string_view marker = format == "jpeg"  ? "\xff\xd9"
+                                    : format == "png" ? "IEND\xae\x42\x60\x82"
+                                                      : "";
+    if (marker.empty()) return true;
     constexpr std::streamoff kTailBytes = 65536;
     std::ifstream file(path, std::ios::binary | std::ios::ate);
     file.seekg(-std::min<std::streamoff>(file.tellg(), kTailBytes), std::ios::end);
     const std::string tail{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
-    return tail.find("\xff\xd9") != std::string::npos;
+    return tail.find(marker) != std::string::npos;
 }
 
 }  // namespace
@@ -52,7 +58,7 @@ Input::Input(const std::string& path) : path_(path) {
     wishes["oiio:UnassociatedAlpha"] = 1;
     image_ = OIIO::ImageInput::open(path_, &wishes);
     if (!image_) failReading(path_, OIIO::geterror());
-    if (formatName() == "jpeg" && !isWholeJPEG(path_)) throw Error(path_, "is cut off");
+    if (!hasEnd(path_, formatName())) throw Error(path_, "is cut off");
     if (formatName() != "dpx") return;
     image_->close();
     file_ = std::make_unique<WatchedFile>(path_);

@@ -59,8 +59,8 @@ void addColourOptions(CLI::App& command, ColourOptions& options) {
                                                    {"cubic", Method::Cubic}};
     command.add_option("--mode", options.method, "Interpolation of a lattice (trilinear)")
         ->transform(CLI::CheckedTransformer(methods, CLI::ignore_case)
-                        .description("step|staggered|trilinear|tetrahedral|cubic"))
-        ->type_name("");
+                        .description("{step,staggered,trilinear,tetrahedral,cubic}"))
+        ->type_name("METHOD");
     command.add_flag("--extrapolate", options.extrapolates,
                      "Continue a lattice beyond its domain in straight lines; else clamp to it");
 }

@@ -51,11 +51,13 @@ void warnOfRemarks(const std::string& name, const std::vector<ol::Remark>& remar
     }
 }
 
-boost::shared_ptr<ol::LUTFileReader> makeReader(const std::string& name,
+/// A file that is not there has no format either.
+boost::shared_ptr<ol::LUTFileReader> makeReader(const std::string& file, const std::string& name,
                                                 const std::string& extension) {
     try {
         return ol::createReader("", true, extension);
     } catch (const ol::Exception& exception) {
+        ol::expectReadableFile(file, name);
         throw Failure(
             fmt::format("{}: {}", name, formatProblem(exception.message(), extension, "--from")));
     }
@@ -87,6 +89,7 @@ void addReadOptions(CLI::App& command, ReadOptions& options) {
                      "Go by the letter of the format, as the library's calls do");
     command
         .add_option("--read-format-3dl", options.format3DL, "Dialect of a .3dl file that is read")
+        ->type_name("DIALECT")
         ->check(CLI::IsMember({"auto", "flame", "lustre", "scratch"}))
         ->capture_default_str();
     command
@@ -127,8 +130,8 @@ Table readTable(const std::string& path, const ReadOptions& options, const std::
     const std::string file = isStandardInput ? "/dev/stdin" : path;
     const std::string shown = !name.empty() ? name : isStandardInput ? "standard input" : path;
     const std::string extension = formatOf(path, options.from);
-    const auto reader = makeReader(shown, extension);
     try {
+        const auto reader = makeReader(file, shown, extension);
         Table table = readTable(*reader, file, shown, options);
         table.extension = extension;
         return table;

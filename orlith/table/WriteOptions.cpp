@@ -49,6 +49,7 @@ void addWriteOptions(CLI::App& command, WriteOptions& options) {
     command.add_flag("--clamp-output,!--no-clamp-output", options.clampOutput,
                      "Clamp the codes of a .3dl file to their bits (default)");
     command.add_option("--format-3dl", options.format3DL, "Dialect of a .3dl file")
+        ->type_name("DIALECT")
         ->check(CLI::IsMember({"flame", "lustre", "scratch"}))
         ->capture_default_str();
     addReal(command, "--scale", "Multiplies the codes of a .3dl file",
@@ -65,6 +66,7 @@ void addWriteOptions(CLI::App& command, WriteOptions& options) {
         .add_option(
             "--style1d", options.style1d,
             "Ramp of that pre-LUT: linear, or logarithmic, which is a smooth step (default)")
+        ->type_name("STYLE")
         ->check(CLI::IsMember({"linear", "logarithmic"}));
 }
 

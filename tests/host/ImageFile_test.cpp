@@ -279,7 +279,10 @@ TEST_F(ImageFileTest, FormatsHoldThePatternAndAreRefusedWhenCutOff) {
         }
 
         const auto byteCount = std::filesystem::file_size(path);
-        for (const std::uintmax_t kept : {byteCount * 9 / 10, byteCount / 2, byteCount / 10}) {
+        // TGA files end with a preview and a footer.
+        const std::uintmax_t cut = std::string(each.name) == "f.tga" ? byteCount / 10 : 1;
+        for (const std::uintmax_t kept :
+             {byteCount - cut, byteCount * 9 / 10, byteCount / 2, byteCount / 10}) {
             std::filesystem::resize_file(path, kept);
             const std::string failure = failureOf([&] { readRow(path); });
             EXPECT_EQ(failure.find(path + ": "), 0U) << kept << " bytes: " << failure;

@@ -160,7 +160,7 @@ def test_a_file_is_whole_or_what_was_there():
             look(domain=(0, 4)).write(target)
     broken = look()
     broken.samples[0, 0, 0] = np.nan
-    with pytest.raises(orlith.Error, match="while reading back"):
+    with pytest.raises(orlith.Error, match="not finite"):
         broken.write("a.cube")
     with pytest.raises(orlith.Error, match="at most 65"):
         look().write(target, size=66)

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <boost/smart_ptr/make_shared.hpp>
+#include <cmath>
 #include <stdexcept>
 
 #include "lut/LUT1D.h"
@@ -24,20 +25,21 @@ struct Capacity {
     bool holdsInputShaper;
     bool holdsOutputShaper;
     bool holdsDomain;
+    bool holdsAnyNumber;  // also what is not finite
 };
 
 // clang-format off
 constexpr Capacity kCapacities[] = {
-    //         curves unequal points input  output domain
-    {".cube",  true,  false,  0,     false, false, true},
-    {".csp",   true,  true,   0,     true,  true,  true},
-    {".3dl",   false, false,  65,    false, false, false},
-    {".cms",   false, false,  0,     false, true,  false},
-    {".cub",   false, true,   0,     false, true,  false},
-    {".blut",  false, false,  kBLUTMostPoints, false, false, true},
-    {".vf",    false, false,  0,     false, false, false},
-    {".vfz",   false, false,  0,     false, false, false},
-    {".gz",    false, false,  0,     false, false, false},
+    //         curves unequal points input  output domain any number
+    {".cube",  true,  false,  0,     false, false, true,  false},
+    {".csp",   true,  true,   0,     true,  true,  true,  false},
+    {".3dl",   false, false,  65,    false, false, false, false},
+    {".cms",   false, false,  0,     false, true,  false, false},
+    {".cub",   false, true,   0,     false, true,  false, false},
+    {".blut",  false, false,  kBLUTMostPoints, false, false, true,  true},
+    {".vf",    false, false,  0,     false, false, false, false},
+    {".vfz",   false, false,  0,     false, false, false, false},
+    {".gz",    false, false,  0,     false, false, false, false},
 };
 // clang-format on
 
@@ -63,6 +65,11 @@ std::string whyNot(const LUT& lut, const Capacity& capacity) {
     const bool isBehindShaper = !lut.outputShaper.empty() && capacity.holdsOutputShaper;
     if (!isUnit(domainOf(lut)) && !capacity.holdsDomain && !isBehindShaper) return "its domain";
     return "";
+}
+
+bool isFinite(const LUT& lut) {
+    return std::all_of(lut.data(), lut.data() + 3 * pointCount(lut),
+                       [](float sample) { return std::isfinite(sample); });
 }
 
 int largestSide(const LUT& lut) {
@@ -108,6 +115,10 @@ bool takesRamp(const std::string& extension) {
 
 Fitted fit(const boost::shared_ptr<LUT>& lut, const std::string& extension, int size) {
     const Capacity& capacity = capacityOf(extension);
+    if (!capacity.holdsAnyNumber && !isFinite(*lut)) {
+        throw std::invalid_argument("the table has samples that are not finite, which " +
+                                    extension + " files cannot hold");
+    }
     Fitted fitted{lut, whyNot(*lut, capacity), false};
     const bool staysCurve = lut->is1D() && capacity.holdsCurves;
     const bool isOtherSize = size > 0 && (size != lut->width() || !hasEqualSides(*lut));

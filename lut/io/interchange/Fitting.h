@@ -28,7 +28,8 @@ struct Fitted {
 ///
 /// @param size       points a side wanted; 0: the table's own, or 33 where a curve becomes a
 ///                   lattice
-/// @throws std::invalid_argument  the format has no tables of that size; the text says so
+/// @throws std::invalid_argument  the format has no tables of that size, or with samples that are
+///                                not finite; the text says so
 Fitted fit(const boost::shared_ptr<LUT>& lut, const std::string& extension, int size);
 
 }  // namespace Orlith::LUT

@@ -28,15 +28,6 @@ void setReaderProperties(LUTFileReader& reader, const ReadOptions& options) {
         property::makeProperty<property::Int>("normalizeOutput", options.normalizeOutput ? 1 : 0));
 }
 
-/// Answers for the commonest mistakes in the system's words.
-void expectReadableFile(const std::string& path, const std::string& name) {
-    std::error_code ignored;
-    if (std::filesystem::is_directory(path, ignored)) throw FileError(name, 0, "is a folder");
-    if (access(path.c_str(), R_OK) != 0) {
-        throw FileError(name, 0, std::generic_category().message(errno));
-    }
-}
-
 /// The last remark is the failure's reason; those before may have led to it.
 FileError failureOf(const LUTFileReader& reader, const Exception& exception,
                     const std::string& name) {
@@ -50,6 +41,14 @@ FileError failureOf(const LUTFileReader& reader, const Exception& exception,
 }
 
 }  // namespace
+
+void expectReadableFile(const std::string& path, const std::string& name) {
+    std::error_code ignored;
+    if (std::filesystem::is_directory(path, ignored)) throw FileError(name, 0, "is a folder");
+    if (access(path.c_str(), R_OK) != 0) {
+        throw FileError(name, 0, std::generic_category().message(errno));
+    }
+}
 
 Table readTable(LUTFileReader& reader, const std::string& path, const std::string& name,
                 const ReadOptions& options) {

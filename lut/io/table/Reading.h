@@ -33,6 +33,10 @@ struct Table {
     bool isFilled() const { return samplesRead >= pointCount; }
 };
 
+/// Answers for the commonest mistakes in the system's words.
+/// @throws FileError
+void expectReadableFile(const std::string& path, const std::string& name);
+
 /// Reads a table, whether its file fills it or not.
 /// @param reader      a new one of the format
 /// @param name        what a failure calls the file
