@@ -62,6 +62,10 @@ std::string markedNegative(const std::string& word) {
     return looksLikeOption && parseReal(word, ignored) ? " " + word : word;
 }
 
+CLI::App* addCommand(CLI::App& program, const std::string& name, const std::string& description) {
+    return program.add_subcommand(name, description);
+}
+
 CLI::Option* addInteger(CLI::App& command, const std::string& name, int least, int most,
                         const std::string& description, std::function<void(int)> use) {
     return command

@@ -20,6 +20,9 @@ bool parseReal(std::string_view word, double& number);
 /// a blank in front of "-inf" or "-.5" tells them apart.
 std::string markedNegative(const std::string& word);
 
+/// Adds a command. The parser is all in headers: what makes a command is compiled here alone.
+CLI::App* addCommand(CLI::App& program, const std::string& name, const std::string& description);
+
 /// Adds an option that takes an integer within a range.
 CLI::Option* addInteger(CLI::App& command, const std::string& name, int least, int most,
                         const std::string& description, std::function<void(int)> use);

@@ -214,7 +214,7 @@ int runApply(const ApplyOptions& options) {
 
 void addApply(CLI::App& program, int& status) {
     CLI::App* const command =
-        program.add_subcommand("apply", "Send the colours of images through tables");
+        addCommand(program, "apply", "Send the colours of images through tables");
     const auto options = std::make_shared<ApplyOptions>();
     command->add_option("IMAGE", options->image, "Image to read: EXR, TIFF, DPX, PNG, JPEG ...")
         ->required();

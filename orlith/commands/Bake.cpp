@@ -174,8 +174,8 @@ int runBake(const BakeOptions& options) {
 }  // namespace
 
 void addBake(CLI::App& program, const std::vector<std::string>& programWords, int& status) {
-    CLI::App* const command = program.add_subcommand(
-        "bake", "Make one table of other tables, of an image program's look, or of both");
+    CLI::App* const command = addCommand(
+        program, "bake", "Make one table of other tables, of an image program's look, or of both");
     const auto options = std::make_shared<BakeOptions>();
     command->footer(
         "-- PROGRAM ARG...           Image program, run as it is; {in} and {out} in its words are\n"

@@ -65,7 +65,7 @@ int runConvert(const ConvertOptions& options) {
 }  // namespace
 
 void addConvert(CLI::App& program, int& status) {
-    CLI::App* const command = program.add_subcommand("convert", "Write a table in another format");
+    CLI::App* const command = addCommand(program, "convert", "Write a table in another format");
     const auto options = std::make_shared<ConvertOptions>();
     command->add_option("IN_LUT", options->input, "Table to read")->required();
     addFromOption(*command, options->reading);

@@ -119,8 +119,9 @@ int runDiff(const DiffOptions& options) {
 }  // namespace
 
 void addDiff(CLI::App& program, int& status) {
-    CLI::App* const command = program.add_subcommand(
-        "diff", "Compare two tables; exit status 1 where they differ by more than the tolerance");
+    CLI::App* const command = addCommand(
+        program, "diff",
+        "Compare two tables; exit status 1 where they differ by more than the tolerance");
     const auto options = std::make_shared<DiffOptions>();
     command->add_option("LUT_A", options->a, "Table to read")->required();
     command->add_option("LUT_B", options->b, "Table to compare it with")->required();

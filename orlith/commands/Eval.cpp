@@ -95,8 +95,8 @@ int runEval(const EvalOptions& options) {
 }  // namespace
 
 void addEval(CLI::App& program, int& status) {
-    CLI::App* const command = program.add_subcommand(
-        "eval", "Send a colour, or each line of standard input, through a table");
+    CLI::App* const command = addCommand(
+        program, "eval", "Send a colour, or each line of standard input, through a table");
     const auto options = std::make_shared<EvalOptions>();
     command->add_option("LUT", options->path, "Table to read")->required();
     command->add_option("COLOUR", options->colour, "Red, green and blue")->expected(3);

@@ -152,8 +152,8 @@ int runGenerate(const GenerateOptions& options) {
 }  // namespace
 
 void addGenerate(CLI::App& program, int& status) {
-    CLI::App* const command = program.add_subcommand(
-        "generate", "Run the GenerateLUT operator on a processed test pattern");
+    CLI::App* const command =
+        addCommand(program, "generate", "Run the GenerateLUT operator on a processed test pattern");
     const auto options = std::make_shared<GenerateOptions>();
     command->add_option("IMAGE", options->image, "Processed pattern: EXR, TIFF, DPX, PNG ...")
         ->required();

@@ -10,6 +10,7 @@
 #include "orlith/FactsInWords.h"
 #include "orlith/Json.h"
 #include "orlith/Messages.h"
+#include "orlith/Options.h"
 #include "orlith/table/TableFile.h"
 #include "report/Report.h"
 
@@ -187,7 +188,7 @@ int runInfo(const InfoOptions& options) {
 }  // namespace
 
 void addInfo(CLI::App& program, int& status) {
-    CLI::App* const command = program.add_subcommand("info", "Say what a table file holds");
+    CLI::App* const command = addCommand(program, "info", "Say what a table file holds");
     const auto options = std::make_shared<InfoOptions>();
     command->add_option("LUT", options->path, "Table to read")->required();
     addFromOption(*command, options->reading);

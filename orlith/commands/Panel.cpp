@@ -4,6 +4,7 @@
 #include "orlith/Command.h"
 #include "orlith/Knobs.h"
 #include "orlith/Messages.h"
+#include "orlith/Options.h"
 
 namespace orlith {
 namespace {
@@ -62,7 +63,7 @@ int runPanel(const Knobs& knobs) {
 
 void addPanel(CLI::App& program, int& status) {
     CLI::App* const command =
-        program.add_subcommand("panel", "Show the operator's controls as its panel does");
+        addCommand(program, "panel", "Show the operator's controls as its panel does");
     const auto knobs = std::make_shared<Knobs>();
     addKnobOption(*command, *knobs);
     command->callback([knobs, &status] { status = runPanel(*knobs); });

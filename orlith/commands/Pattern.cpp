@@ -50,7 +50,7 @@ int runPattern(const PatternOptions& options) {
 
 void addPattern(CLI::App& program, int& status) {
     CLI::App* const command =
-        program.add_subcommand("pattern", "Write the test pattern of a colour cube as an image");
+        addCommand(program, "pattern", "Write the test pattern of a colour cube as an image");
     const auto options = std::make_shared<PatternOptions>();
     command->add_option("OUT_IMAGE", options->path, "Image to write; EXR keeps every digit")
         ->required();

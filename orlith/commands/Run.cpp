@@ -10,6 +10,7 @@
 #include "orlith/Command.h"
 #include "orlith/Generated.h"
 #include "orlith/Messages.h"
+#include "orlith/Options.h"
 #include "orlith/OutputFile.h"
 #include "orlith/pattern/PatternReading.h"
 
@@ -122,7 +123,7 @@ int runRun(const RunOptions& options) {
 
 void addRun(CLI::App& program, int& status) {
     CLI::App* const command =
-        program.add_subcommand("run", "Load a script of saved nodes and press buttons");
+        addCommand(program, "run", "Load a script of saved nodes and press buttons");
     const auto options = std::make_shared<RunOptions>();
     command->add_option("SCRIPT", options->script, "Saved nodes (Tcl)")->required();
     command

@@ -12,6 +12,7 @@
 #include "orlith/FactsInWords.h"
 #include "orlith/ImageOptions.h"
 #include "orlith/Messages.h"
+#include "orlith/Options.h"
 #include "orlith/OutputFile.h"
 #include "orlith/ShownPicture.h"
 #include "orlith/table/ColourOptions.h"
@@ -136,8 +137,8 @@ int runView(const ViewOptions& options) {
 }  // namespace
 
 void addView(CLI::App& program, int& status) {
-    CLI::App* const command = program.add_subcommand(
-        "view", "Show a table, or two and their difference, as a page for a browser");
+    CLI::App* const command = addCommand(
+        program, "view", "Show a table, or two and their difference, as a page for a browser");
     const auto options = std::make_shared<ViewOptions>();
     command->add_option("LUT", options->a, "Table to show")->required();
     command->add_option("LUT_B", options->b, "Table to compare it with");
