@@ -12,7 +12,7 @@ OUR_SOURCES = $(shell git ls-files '*.cpp' '*.h')
 say = @printf '\n== %s\n' "$(1)"
 
 .PHONY: help demo test build bench fuzz asan format lint install package \
-    package-check packages packages-develop
+    package-check packages packages-develop packages-packaging
 .DEFAULT_GOAL := help
 
 help:
@@ -45,6 +45,9 @@ packages:
 
 packages-develop:
 	$(call install_packages,build|develop)
+
+packages-packaging:
+	$(call install_packages,build|packaging)
 
 build: packages
 	$(call say,building ($(BUILD)))
@@ -111,7 +114,7 @@ install: build
 	cmake --install $(BUILD) --prefix $(PREFIX)
 
 # Dated by the last commit, so that the same source gives the same documents.
-package: packages-develop
+package: packages-packaging
 	$(call say,building packages ($(PACKAGES)))
 	@export SOURCE_DATE_EPOCH=$$(git log -1 --format=%ct) && cmake --preset package
 	@cmake --build $(PACKAGES)
