@@ -1,5 +1,6 @@
 #include "orlith/ImageOptions.h"
 
+#include <CLI/CLI.hpp>
 #include <limits>
 #include <vector>
 

@@ -1,11 +1,14 @@
 #pragma once
 
-#include <CLI/CLI.hpp>
 #include <string>
 
 #include "host/Host.h"
 #include "host/ImageCodec.h"
 #include "zefra/Iop.h"
+
+namespace CLI {
+class App;
+}  // namespace CLI
 
 namespace orlith {
 

@@ -1,5 +1,7 @@
 #include "orlith/Knobs.h"
 
+#include <CLI/CLI.hpp>
+
 #include "host/Error.h"
 #include "orlith/Command.h"
 

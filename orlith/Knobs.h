@@ -1,11 +1,14 @@
 #pragma once
 
-#include <CLI/CLI.hpp>
 #include <string>
 #include <utility>
 #include <vector>
 
 #include "host/Node.h"
+
+namespace CLI {
+class App;
+}  // namespace CLI
 
 namespace orlith {
 

@@ -1,6 +1,7 @@
 #include "orlith/Options.h"
 
 #include <fmt/format.h>
+#include <CLI/CLI.hpp>
 
 #include <algorithm>
 #include <charconv>

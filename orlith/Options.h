@@ -1,11 +1,15 @@
 #pragma once
 
-#include <CLI/CLI.hpp>
 #include <functional>
 #include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
+
+namespace CLI {
+class App;
+class Option;
+}  // namespace CLI
 
 namespace orlith {
 

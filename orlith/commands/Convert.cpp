@@ -1,4 +1,5 @@
 #include <fmt/format.h>
+#include <CLI/CLI.hpp>
 
 #include "lut/evaluation/Look.h"
 #include "lut/io/interchange/Fitting.h"

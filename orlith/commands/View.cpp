@@ -1,5 +1,6 @@
 #include <fmt/chrono.h>
 #include <fmt/format.h>
+#include <CLI/CLI.hpp>
 
 #include <cerrno>
 #include <ctime>

@@ -1,5 +1,6 @@
 #include "orlith/table/ColourOptions.h"
 
+#include <CLI/CLI.hpp>
 #include <map>
 #include <string>
 

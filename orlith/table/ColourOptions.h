@@ -1,10 +1,13 @@
 #pragma once
 
-#include <CLI/CLI.hpp>
 #include <boost/smart_ptr/shared_ptr.hpp>
 
 #include "lut/Evaluator.h"
 #include "lut/evaluation/Look.h"
+
+namespace CLI {
+class App;
+}  // namespace CLI
 
 namespace orlith {
 

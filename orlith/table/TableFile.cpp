@@ -1,6 +1,7 @@
 #include "orlith/table/TableFile.h"
 
 #include <fmt/format.h>
+#include <CLI/CLI.hpp>
 
 #include <cmath>
 #include <filesystem>

@@ -1,11 +1,14 @@
 #pragma once
 
-#include <CLI/CLI.hpp>
 #include <string>
 
 #include "lut/LUT.h"
 #include "lut/io/table/FileFormat.h"
 #include "lut/io/table/Reading.h"
+
+namespace CLI {
+class App;
+}  // namespace CLI
 
 namespace orlith {
 

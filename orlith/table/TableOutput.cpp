@@ -1,6 +1,7 @@
 #include "orlith/table/TableOutput.h"
 
 #include <fmt/format.h>
+#include <CLI/CLI.hpp>
 
 #include <cerrno>
 #include <stdexcept>

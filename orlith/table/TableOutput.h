@@ -1,6 +1,5 @@
 #pragma once
 
-#include <CLI/CLI.hpp>
 #include <boost/smart_ptr/shared_ptr.hpp>
 #include <functional>
 #include <string>
@@ -11,6 +10,10 @@
 #include "orlith/OutputFile.h"
 #include "orlith/table/TableFile.h"
 #include "orlith/table/WriteOptions.h"
+
+namespace CLI {
+class App;
+}  // namespace CLI
 
 namespace orlith {
 

@@ -1,5 +1,7 @@
 #include "orlith/table/WriteOptions.h"
 
+#include <CLI/CLI.hpp>
+
 #include "lut/RampFill.h"
 #include "orlith/Options.h"
 

@@ -1,12 +1,15 @@
 #pragma once
 
-#include <CLI/CLI.hpp>
 #include <optional>
 #include <string>
 #include <vector>
 
 #include "lut/LUT.h"
 #include "lut/io/table/Options3DL.h"
+
+namespace CLI {
+class App;
+}  // namespace CLI
 
 namespace orlith {
 
