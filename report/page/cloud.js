@@ -53,6 +53,7 @@ class CloudView {
       return;
     }
     this.scale = cloudScale();
+    this.renderer = new THREE.WebGLRenderer({ antialias: true });
     this.camera = new THREE.PerspectiveCamera(35, 1, 0.1, 20);
     this.camera.position.set(1.9, 1.35, 2.6).add(new THREE.Vector3(0.5, 0.5, 0.5));
     this.views = [
@@ -63,8 +64,8 @@ class CloudView {
     if (isPair) names.push(`Lines from ${tables[0].letter} to ${tables[1].letter}`);
     choices(byId("cloud-choice"), names, (index) => this.showLines(index));
     byId("cloud-caption").textContent =
-      "Drag to turn, turn the wheel to come nearer; arrow keys turn as well." +
-      (this.scale.isCommon ? "" : " Inputs and outputs have scales of their own.");
+      this.scale.isCommon ? "" : "Inputs and outputs have scales of their own.";
+    byId("cloud-hint").textContent = "Drag to turn; after a click the wheel comes nearer. Arrow keys turn as well.";
     drawn(() => this.render());
   }
 
@@ -72,7 +73,6 @@ class CloudView {
     const canvas = element("canvas", { tabIndex: 0, role: "img", ariaLabel: `${name}: cloud of the lattice's points. Arrow keys turn it.` });
     const box = element("div", { className: "cloud" }, canvas);
     byId("cloud-views").append(element("figure", {}, box, element("figcaption", {}, name)));
-    const renderer = new THREE.WebGLRenderer({ canvas, antialias: true, preserveDrawingBuffer: true });
     const scene = new THREE.Scene();
     scene.add(this.frame(), this.points(t));
     const lines = new THREE.Group();
@@ -82,11 +82,15 @@ class CloudView {
     const controls = new THREE.OrbitControls(this.camera, canvas);
     Object.assign(controls, { enableKeys: false, enablePan: false, minDistance: 1.2, maxDistance: 8 });
     controls.target.set(0.5, 0.5, 0.5);
+    // Deliberate: a wheel that only passes by scrolls the page.
+    controls.enableZoom = false;
+    canvas.addEventListener("focus", () => { controls.enableZoom = true; });
+    canvas.addEventListener("blur", () => { controls.enableZoom = false; });
     controls.update();
     controls.addEventListener("change", () => this.render());
     canvas.addEventListener("keydown", (event) => this.turn(event));
     new ResizeObserver(() => this.render()).observe(box);
-    return { t, box, renderer, scene, lines, mark };
+    return { t, box, canvas, scene, lines, mark };
   }
 
   /** Where a point of the lattice stands in a view: t is its table, null for the input. */
@@ -187,15 +191,21 @@ class CloudView {
     this.render();
   }
 
+  /** One renderer for all views; what it drew is copied, as browsers do not print WebGL. */
   render() {
+    const { renderer, camera } = this;
     this.frameMaterial.color.set(theme().quiet);
-    for (const { box, renderer, scene } of this.views ?? []) {
-      this.camera.aspect = box.clientWidth / Math.max(box.clientHeight, 1);
-      this.camera.updateProjectionMatrix();
-      renderer.setPixelRatio(Math.min(devicePixelRatio, 2));
-      renderer.setSize(box.clientWidth, box.clientHeight, false);
-      renderer.setClearColor(theme().space);
-      renderer.render(scene, this.camera);
+    renderer.setClearColor(theme().space);
+    renderer.setPixelRatio(Math.min(devicePixelRatio, 2));
+    for (const { box, canvas, scene } of this.views ?? []) {
+      const [width, height] = [box.clientWidth, Math.max(box.clientHeight, 1)];
+      camera.aspect = width / height;
+      camera.updateProjectionMatrix();
+      renderer.setSize(width, height, false);
+      renderer.render(scene, camera);
+      const drawing = renderer.domElement;
+      Object.assign(canvas, { width: drawing.width, height: drawing.height });
+      canvas.getContext("2d").drawImage(drawing, 0, 0);
     }
   }
 }

@@ -7,9 +7,26 @@ const curves = data.curves.map((curve) => ({
   tables: curve.tables.map((each) => ({ outputs: floatsOf(each.outputs), slopes: floatsOf(each.slopes) })),
 }));
 
-// Where equal lines lie on each other the upper ones let the lower ones show.
-const channelDashes = [[], [9, 6], [2, 5]];
-const secondTableDash = [5, 4];
+/** The mark of a line. Equal lines lie on each other: each lets those below it show. */
+function lineStyle(t, c) {
+  const { channels, pales } = theme();
+  if (!isPair) {
+    return {
+      borderColor: channels[c],
+      borderWidth: [4, 4, 3.5][c],
+      borderDash: [[], [16, 16], [6, 10]][c],
+      borderDashOffset: [0, 0, -5][c],  // a dot in each dash of green, and one in each gap
+    };
+  }
+  if (t === 0) return { borderColor: pales[c], borderWidth: [7, 4, 2][c] };
+  return { borderColor: channels[c], borderWidth: 2, borderDash: [6, 9], borderDashOffset: -5 * c };
+}
+
+/** A step of 1, 2 or 5 in some decimal place, with which about four fill a distance. */
+function roundStep(distance) {
+  const power = 10 ** Math.floor(Math.log10(distance / 4));
+  return [1, 2, 5, 10].find((factor) => factor * power >= distance / 4) * power;
+}
 
 class CurveView {
   constructor() {
@@ -88,7 +105,7 @@ class CurveView {
     const { inputs, channel } = this.curve;
     byId("curve-caption").textContent =
       (channel < 0 ? "Red, green and blue rise together." : `${this.curve.name}: the others stay at ${triple(this.curve.base.filter((_, c) => c !== channel))}.`) +
-      (isPair ? ` Full lines: A, ${tables[0].name}; broken lines: B, ${tables[1].name}.` : " Red is a full line, green broken, blue dotted.") +
+      (isPair ? " Pale lines: A; broken lines: B." : " Red is a full line, green broken, blue dotted.") +
       " Grey: what would not be changed.";
     const points = (values, c) => Array.from(inputs, (x, i) => {
       const y = values[3 * i + c];
@@ -98,9 +115,9 @@ class CurveView {
       channelNames.map((name, c) => ({
         label: name,
         data: points(table[key], c),
-        borderColor: theme().channels[c],
-        borderWidth: channel === c || (channel < 0 && !isPair && c === 0) ? 3 : 2,
-        borderDash: t === 1 ? secondTableDash : isPair ? [] : channelDashes[c],
+        clip: 4,  // a line along the edge is drawn in its whole width
+        order: -(3 * t + c),
+        ...lineStyle(t, c),
       })));
     const ends = [inputs[0], inputs[inputs.length - 1]];
     const identity = (ys) => ({
@@ -110,26 +127,30 @@ class CurveView {
       borderWidth: 1,
       order: 1,
     });
-    this.update(this.values, [...lines("outputs"), identity(ends)], ends);
-    this.slopes.options.scales.y.max = this.slopeLimit();
-    this.slopes.options.scales.y.suggestedMin = 0;
-    this.update(this.slopes, [...lines("slopes"), identity([1, 1])], ends);
+    this.update(this.values, [...lines("outputs"), identity(ends)], ends, {});
+    const { min, max, step } = this.slopeRange();
+    Object.assign(this.slopes.options.scales.y, { min, max });
+    this.update(this.slopes, [...lines("slopes"), identity([1, 1])], ends, { stepSize: step });
     this.showValues();
     this.showPlace();
   }
 
-  /** Where the slope's axis ends: a steep begin, as of a power function, would flatten all the rest. */
-  slopeLimit() {
+  /** The slope's axis, from tick to tick: a steep begin, as of a power function, would flatten all the rest. */
+  slopeRange() {
     const all = this.curve.tables.flatMap((table) => Array.from(table.slopes).filter(Number.isFinite)).sort((a, b) => a - b);
-    return Math.max(2, 1.25 * (all[Math.floor(0.98 * (all.length - 1))] ?? 0));
+    const most = Math.max(2, 1.25 * (all[Math.floor(0.98 * (all.length - 1))] ?? 0));
+    const least = Math.max(all[0] ?? 0, -most);
+    const step = roundStep(most - Math.min(least, 0));
+    const isFalling = least < -0.02 * most;  // less is rounding
+    return { min: isFalling ? step * Math.floor(least / step) : 0, max: step * Math.ceil(most / step), step };
   }
 
-  update(chart, datasets, [min, max]) {
+  update(chart, datasets, [min, max], yTicks) {
     const { ink, quiet, rule } = theme();
     chart.data.datasets = datasets;
     Object.assign(chart.options.scales.x, { min, max, ticks: { color: quiet }, grid: { color: rule } });
     Object.assign(chart.options.scales.y, {
-      ticks: { color: quiet },
+      ticks: { color: quiet, ...yTicks },
       grid: { color: rule },
       afterFit: (scale) => { scale.width = 58; },  // so that both charts begin at one line
     });
@@ -187,18 +208,15 @@ class CurveView {
   showPlace() {
     this.values.draw();
     this.slopes.draw();
-    const parts = [element("b", {}, "in "), element("span", { id: "curve-in" }, triple(this.inputColour(this.index), exact))];
-    this.curve.tables.forEach((table, t) => {
+    const input = element("span", { id: "curve-in" }, triple(this.inputColour(this.index), exact));
+    const readings = this.curve.tables.flatMap((table, t) => {
       const output = this.output(t, this.index);
-      const swatch = element("span", { className: "swatch" });
-      swatch.style.background = cssColour(Array.from(output));
-      parts.push(
-        element("b", {}, isPair ? `\u2003${tables[t].letter} ` : "\u2003out "), swatch,
-        element("span", { id: `curve-out-${t}` }, triple(output, exact)),
-        element("b", {}, "\u2003slope "), triple(table.slopes.subarray(3 * this.index, 3 * this.index + 3)),
-      );
+      return [
+        reading(isPair ? tables[t].letter : "out", element("span", { id: `curve-out-${t}` }, triple(output, exact)), output),
+        reading("slope", triple(table.slopes.subarray(3 * this.index, 3 * this.index + 3))),
+      ];
     });
-    clear(byId("curve-readout"), ...parts);
+    clear(byId("curve-readout"), reading("in", input), ...readings);
   }
 
   /** Some values in full, for paper and for who has no pointer. */
@@ -209,11 +227,9 @@ class CurveView {
     const grey = nearestIndex(inputs, 0.18);
     if (Math.abs(inputs[grey] - 0.18) < 1e-6) places.push(grey);
     const sorted = [...new Set(places)].sort((a, b) => a - b);
-    const line = (name, write) => [name, ...sorted.map(write)];
-    clear(byId("curve-values"), tableOf(
-      line("input", (index) => brief(inputs[index])),
-      tables.flatMap((table, t) => channelNames.map((name, c) =>
-        line(isPair ? `${table.letter} ${name}` : name, (index) => brief(this.output(t, index)[c])))),
-    ));
+    clear(byId("curve-values"), ...tables.map((table, t) => tableOf(
+      [isPair ? `${table.letter}: input` : "input", ...channelNames],
+      sorted.map((index) => [brief(inputs[index]), ...Array.from(this.output(t, index), (value) => brief(value))]),
+    )));
   }
 }

@@ -38,12 +38,20 @@ function tableOf(headings, rows) {
   );
 }
 
+/** A label and the values of a colour, in one piece; with a swatch of it where `shown` is given. */
+function reading(label, values, shown) {
+  const swatch = element("span", { className: "swatch" });
+  if (shown) swatch.style.background = cssColour(Array.from(shown));
+  return element("span", { className: "reading" }, element("b", {}, label), " ", ...(shown ? [swatch] : []), values);
+}
+
 /** The style sheet's colours, as they are now. */
 function theme() {
   const style = getComputedStyle(document.documentElement);
   const named = (name) => style.getPropertyValue(`--${name}`).trim();
   return {
     channels: channelNames.map(named),
+    pales: channelNames.map((name) => named(`pale-${name}`)),
     ink: named("ink"),
     quiet: named("quiet"),
     rule: named("rule"),

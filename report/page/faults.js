@@ -26,16 +26,21 @@ function showFault(fault, views) {
   });
 }
 
+/** A text whose colours stay on one line. */
+function unbroken(text) {
+  return text.replace(/(?<=\d) (?=-?\d)/g, "\u00a0");
+}
+
 function showFaults(views) {
   clear(byId("fault-lists"), element("div", { className: "columns" }, ...tables.map((table) => {
-    const heading = isPair ? [element("h3", {}, table.name)] : [];
+    const heading = isPair ? [element("h3", {}, `${table.letter}: ${table.name}`)] : [];
     if (table.faults === null) return element("div", {}, ...heading, element("p", {}, "Not looked for."));
     if (table.faults.length === 0) {
       return element("div", {}, ...heading, element("p", { className: "none" },
         "None found: every sample is a number, nothing folds back, jumps or clips, and neutrals stay neutral."));
     }
     const items = table.faults.map((fault) => {
-      const button = element("button", { type: "button" }, element("span", { className: "kind" }, fault.kind), fault.text);
+      const button = element("button", { type: "button" }, element("span", { className: "kind" }, fault.kind), unbroken(fault.text));
       button.addEventListener("click", () => showFault(fault, views));
       return element("li", {}, button);
     });

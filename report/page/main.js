@@ -18,7 +18,7 @@ function showDifference() {
     tableOf(
       ["", "largest", "mean", "root mean square", "largest at"],
       data.difference.map((each, c) => [channelNames[c], brief(each.largest, 6), brief(each.mean, 6), brief(each.rms, 6),
-        each.largest === 0 ? "–" : triple(each.at)]),
+        each.largest === 0 ? "–" : each.at.map((value) => brief(value)).join(" ")]),
     ),
   );
 }

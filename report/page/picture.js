@@ -2,12 +2,12 @@
 
 function showPicture() {
   const { picture } = data;
-  byId("picture-caption").textContent = picture.caption;
+  byId("picture-caption").textContent = `${picture.caption} Left of the line before, right of it after.`;
   const splits = tables.map((table, t) => {
     const split = element("div", { className: "split" },
       element("img", { src: picture.before, alt: `${picture.name}, before` }),
       element("img", { src: picture.after[t], alt: `${picture.name}, after ${table.name}` }));
-    byId("picture-views").append(element("figure", {}, split, element("figcaption", {}, isPair ? table.name : picture.name)));
+    byId("picture-views").append(element("figure", {}, split, element("figcaption", {}, isPair ? `${table.letter}: ${table.name}` : picture.name)));
     return split;
   });
   const slider = byId("picture-split");

@@ -130,18 +130,11 @@ class SliceView {
       mark.style.top = `${((height - 0.5 - g) / height) * 100}%`;
     });
     const element3D = lattices[0].element(r, g, this.blue);
-    const parts = [element("b", {}, "in "), element("span", { id: "slice-in" }, triple(gridColour(r, g, this.blue), exact))];
-    lattices.forEach((lattice, t) => {
-      const colour = lattice.colour(element3D);
-      const swatch = element("span", { className: "swatch" });
-      swatch.style.background = cssColour(colour);
-      parts.push(element("b", {}, isPair ? `\u2003${tables[t].letter} ` : "\u2003out "), swatch,
-        element("span", { id: `slice-out-${t}` }, triple(colour)));
-    });
-    if (isPair) {
-      const difference = apart(...lattices.map((lattice) => lattice.colour(element3D)));
-      parts.push(element("b", {}, "\u2003difference "), element("span", { id: "slice-difference" }, brief(difference)));
-    }
-    clear(byId("slice-readout"), ...parts);
+    const input = element("span", { id: "slice-in" }, triple(gridColour(r, g, this.blue), exact));
+    const colours = lattices.map((lattice) => lattice.colour(element3D));
+    const readings = [reading("in", input), ...colours.map((colour, t) =>
+      reading(isPair ? tables[t].letter : "out", element("span", { id: `slice-out-${t}` }, triple(colour)), colour))];
+    if (isPair) readings.push(reading("difference", element("span", { id: "slice-difference" }, brief(apart(...colours)))));
+    clear(byId("slice-readout"), ...readings);
   }
 }

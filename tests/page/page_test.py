@@ -13,6 +13,7 @@ import subprocess
 import sys
 import tempfile
 import unittest
+import zlib
 from pathlib import Path
 
 SKIPPED = 77
@@ -65,6 +66,13 @@ def warm(r, g, b):
 def damaged(r, g, b):
     isPlace = (r, g, b) == (0.5, 0.75, 0.25)
     return (r, g + (0.6 if isPlace else 0), b)
+
+
+def images_of(pdf):
+    """Width and bytes of each image that a PDF holds without loss."""
+    for match in re.finditer(rb"/Subtype /Image\s(.*?)>>\s*stream\r?\n", pdf, re.DOTALL):
+        if b"/FlateDecode" in match[1]:
+            yield int(re.search(rb"/Width (\d+)", match[1])[1]), zlib.decompressobj().decompress(pdf[match.end():])
 
 
 def browser(*arguments):
@@ -189,9 +197,15 @@ class PageTest(unittest.TestCase):
     def test_prints_on_two_pages(self):
         for tables in (["warm.cube"], [EVIL, "plain.cube"]):
             self.open(*tables)
+            slices = max(canvas.get_property("width") for canvas in self.driver.find_elements(By.CSS_SELECTOR, "#slices canvas"))
             printed = self.driver.execute_cdp_cmd("Page.printToPDF", {"preferCSSPageSize": True, "printBackground": True})
-            pages = re.findall(rb"/Type /Page\b", base64.b64decode(printed["data"]))
-            self.assertEqual(2, len(pages), tables)
+            pdf = base64.b64decode(printed["data"])
+            self.assertEqual(2, len(re.findall(rb"/Type /Page\b", pdf)), tables)
+            clouds = [image for width, image in images_of(pdf) if width > slices]
+            self.assertEqual(1 + len(tables), len(clouds))
+            for cloud in clouds:
+                self.assertGreater(len(set(cloud)), 100, "a cloud is blank on paper")
+                self.assertEqual(b"\xff" * 3, cloud[:3], "a cloud on paper has the background of the screen")
 
     def test_without_webgl_it_says_so(self):
         driver = browser("--disable-3d-apis")
