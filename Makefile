@@ -102,6 +102,9 @@ asan: packages
 format: packages-develop
 	clang-format -i $(OUR_SOURCES)
 
+# The page's scripts share one scope, so they are checked as one. A Node.js that is not Debian's does
+# not find Debian's modules by itself.
+lint: PAGE = $(BUILD)/page.js
 lint: packages-develop
 	$(call say,checking format)
 	@clang-format --dry-run -Werror $(OUR_SOURCES)
@@ -109,6 +112,9 @@ lint: packages-develop
 	@[ -f $(BUILD)/build.ninja ] || cmake --preset $(PRESET)
 	@printf '%s\n' $(filter-out fuzz/% bench/%,$(filter %.cpp,$(OUR_SOURCES))) \
 	    | xargs -P 2 -n 4 clang-tidy --quiet -p $(BUILD) 2>/dev/null
+	$(call say,checking the page)
+	@cat report/page/*.js > $(PAGE)
+	@NODE_PATH=/usr/share/nodejs eslint --no-eslintrc --config report/page/eslint.json --format unix $(PAGE)
 
 install: build
 	cmake --install $(BUILD) --prefix $(PREFIX)
