@@ -61,7 +61,7 @@ class CurveView {
   }
 
   listen(canvas) {
-    canvas.addEventListener("pointermove", (event) => {
+    onPointer(canvas, (event) => {
       this.goTo(this.values.scales.x.getValueForPixel(event.offsetX));
     });
     canvas.addEventListener("keydown", (event) => {

@@ -45,6 +45,12 @@ function reading(label, values, shown) {
   return element("span", { className: "reading" }, element("b", {}, label), " ", ...(shown ? [swatch] : []), values);
 }
 
+/** Calls with the event of a pointer that moves over a canvas, and of a finger that taps on it. */
+function onPointer(canvas, follow) {
+  canvas.addEventListener("pointerdown", follow);
+  canvas.addEventListener("pointermove", follow);
+}
+
 /** The style sheet's colours, as they are now. */
 function theme() {
   const style = getComputedStyle(document.documentElement);

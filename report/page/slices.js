@@ -76,7 +76,7 @@ class SliceView {
       element("figure", {}, element("div", { className: "slice" }, canvas, mark), element("figcaption", {}, kind.name)),
     );
     const [width, height] = data.grid.size;
-    canvas.addEventListener("pointermove", (event) => {
+    onPointer(canvas, (event) => {
       const r = Math.floor((event.offsetX / canvas.clientWidth) * width);
       const g = height - 1 - Math.floor((event.offsetY / canvas.clientHeight) * height);
       this.goTo(r, g, this.blue);

@@ -21,6 +21,8 @@ SKIPPED = 77
 try:
     from selenium import webdriver
     from selenium.webdriver.common.action_chains import ActionChains
+    from selenium.webdriver.common.actions.action_builder import ActionBuilder
+    from selenium.webdriver.common.actions.pointer_input import PointerInput
     from selenium.webdriver.common.by import By
     from selenium.webdriver.common.keys import Keys
 except ImportError as missing:
@@ -154,6 +156,17 @@ class PageTest(unittest.TestCase):
                 output = self.run_program("eval", table, *options, *place).split()
                 for shown, exact in zip(self.colour("#slice-out-0"), output):
                     self.assertAlmostEqual(float(shown), float(exact), delta=1e-4)
+
+    def test_a_tap_reads_values(self):
+        self.open("warm.cube")
+        for canvas, shown in (("#curve-chart", "#curve-in"), (".slice canvas", "#slice-in")):
+            before = self.colour(shown)
+            canvas = self.element(canvas)
+            self.driver.execute_script("arguments[0].scrollIntoView({block: 'center'})", canvas)
+            actions = ActionBuilder(self.driver, mouse=PointerInput("touch", "finger"))
+            actions.pointer_action.move_to(canvas, int(0.3 * canvas.rect["width"])).pointer_down().pointer_up()
+            actions.perform()
+            self.assertNotEqual(before, self.colour(shown))
 
     def test_a_fault_is_a_click_from_its_place(self):
         self.open(EVIL)
