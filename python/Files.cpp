@@ -119,7 +119,7 @@ ol::Table readFile(const std::string& path, const ol::ReadOptions& options) {
         throw ol::FileError(path, 0, sampleCounts(table));
     }
     if (table.samplesRead > table.pointCount) table.remarks.push_back({0, sampleCounts(table)});
-    if (!options.isStrict) ol::dropIdentityPreLUT(*table.lut);
+    if (!options.isStrict) ol::foldStraightPreLUT(*table.lut);
     return table;
 }
 

@@ -4,6 +4,7 @@
 #include <boost/smart_ptr/make_shared.hpp>
 #include <limits>
 #include <map>
+#include <stdexcept>
 #include <vector>
 
 #include "lut/LUT1D.h"
@@ -62,12 +63,16 @@ Table makeTable(const Shape& sides, const py::object& domain) {
         return static_cast<int>(sides.size() == 1 ? sides[0] : sides[axis]);
     };
     Table table;
-    if (sides.size() == 1) {
-        table.lut = boost::make_shared<ol::LUT1D>();
-        table.lut->resize(points(0));
-    } else {
-        table.lut = boost::make_shared<ol::LUT3D>();
-        table.lut->resize(points(0), points(1), points(2));
+    try {
+        if (sides.size() == 1) {
+            table.lut = boost::make_shared<ol::LUT1D>();
+            table.lut->resize(points(0));
+        } else {
+            table.lut = boost::make_shared<ol::LUT3D>();
+            table.lut->resize(points(0), points(1), points(2));
+        }
+    } catch (const std::length_error&) {
+        throw py::value_error("a table has fewer points than that");
     }
     ol::setDomain(*table.lut, range, {points(0), points(1), points(2)});
     return table;

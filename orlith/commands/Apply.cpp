@@ -70,6 +70,7 @@ struct AppliedTable {
     std::string name;
     ColourWay way;
     Orlith::LUT::Range inputs;
+    bool canGoOn;  // beyond its domain: a curve and a pre-LUT end there
     std::atomic<std::uint64_t> outsideCount{0};  // added to by all threads
 
     void apply(float* rgb, std::size_t colourCount) {
@@ -95,6 +96,8 @@ std::vector<std::unique_ptr<AppliedTable>> readTables(const ApplyOptions& option
         applied.name = table.name;
         applied.way = wayThrough(table.lut, options.colours, options.reading.isStrict);
         applied.inputs = inputRangeOf(*table.lut);
+        applied.canGoOn =
+            !table.lut->is1D() && table.lut->inputShaper.empty() && table.lut->outputShaper.empty();
     }
     return tables;
 }
@@ -177,16 +180,19 @@ private:
     void warnOfColoursOutside(const std::string& image, const host::CopiedImage& copied) {
         for (const auto& each : tables_) {
             const std::uint64_t count = each->outsideCount.exchange(0);
-            const bool isHeld = !options_.reading.isStrict && !options_.colours.extrapolates;
-            if (count == 0 || !isHeld || !clampedTables_.insert(each.get()).second) continue;
+            const bool isHeld = !(options_.colours.extrapolates && each->canGoOn);
+            if (count == 0 || options_.reading.isStrict || !isHeld ||
+                !clampedTables_.insert(each.get()).second)
+                continue;
             progress_.clear();
             const double all = static_cast<double>(copied.width) * copied.height;
             warn(fmt::format(
                 "{}: {:.3g} % of its colours are outside the domain of {}, {} to {}, and"
-                " held at its edge (--extrapolate goes on in straight lines)",
+                " held at its edge{}",
                 image, 100.0 * static_cast<double>(count) / all, each->name,
                 colourText(each->inputs.min.data_block()),
-                colourText(each->inputs.max.data_block())));
+                colourText(each->inputs.max.data_block()),
+                each->canGoOn ? " (--extrapolate goes on in straight lines)" : ""));
         }
     }
 

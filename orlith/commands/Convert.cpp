@@ -40,9 +40,9 @@ int runConvert(const ConvertOptions& options) {
     const bool isStrict = options.reading.isStrict;
     const TableOutput target(options.output, isStrict);
     const Table table = readWholeTable(options.input, options.reading);
-    ol::dropIdentityPreLUT(*table.lut);
     ol::Fitted fitted{table.lut, "", false};
     if (isStrict) {
+        ol::dropIdentityPreLUT(*table.lut);
         warnOfLosses(options.output.path, target.extension(), *table.lut);
     } else {
         fitted = target.fit(table.lut, options.size);

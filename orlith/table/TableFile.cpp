@@ -154,8 +154,7 @@ Table readWholeTable(const std::string& path, const ReadOptions& options) {
     if (!table.isFilled()) throw Failure(fmt::format("{}: {}", table.name, sampleCounts(table)));
     warnOfRemarks(table.name, table.remarks);
     warnOfSurplus(table);
-    // It would hold colours outside at its ends.
-    if (!options.isStrict) ol::dropIdentityPreLUT(*table.lut);
+    if (!options.isStrict) ol::foldStraightPreLUT(*table.lut);
     return table;
 }
 

@@ -11,6 +11,7 @@
 #include "lut/io/Registry.h"
 #include "lut/io/table/Proof.h"
 #include "orlith/Command.h"
+#include "orlith/Messages.h"
 #include "orlith/table/Verification.h"
 
 namespace orlith {
@@ -87,6 +88,8 @@ void TableOutput::write(OutputFile& output, const ol::Fitted& fitted, const Orig
     addPreLUT(*fitted.lut, options_.writing);
     const std::string unreadable = whyUnreadable(extension_, *fitted.lut);
     const std::string clipping = clippingText(*fitted.lut, extension_, options3DL_);
+    // Elsewhere the summary says it.
+    if (options_.isQuiet && !clipping.empty()) warn(fmt::format("{}: {}", output.name(), clipping));
 
     output.interruptAtOnce();
     writeTable(output, fitted.lut);

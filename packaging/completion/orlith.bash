@@ -52,7 +52,8 @@ _orlith()
         --image) _filedir "$images" && return ;;
         --output) _filedir html && return ;;
         --image-type) offered='exr tif dpx png' ;;
-        --from | --to) offered='3dl blut cms csp cub cube itx vf vfz gz' ;;
+        --from) offered='3dl blut cms csp cub cube itx vf vfz gz' ;;
+        --to) offered='3dl blut cms csp cub cube vf' ;;
         --file-type) offered='.3dl .blut .cms .csp .cub .cube .vf' ;;
         --type) offered='uint8 uint10 uint12 uint16 half float' ;;
         --mode) offered='step staggered trilinear tetrahedral cubic' ;;

@@ -138,7 +138,9 @@ class CurveView {
   /** The slope's axis, from tick to tick: a steep begin, as of a power function, would flatten all the rest. */
   slopeRange() {
     const all = this.curve.tables.flatMap((table) => Array.from(table.slopes).filter(Number.isFinite)).sort((a, b) => a - b);
-    const most = Math.max(2, 1.25 * (all[Math.floor(0.98 * (all.length - 1))] ?? 0));
+    const usual = Math.max(2, 1.25 * (all[Math.floor(0.98 * (all.length - 1))] ?? 0));
+    const greatest = all[all.length - 1] ?? 0;
+    const most = greatest <= 2 * usual ? Math.max(usual, greatest) : usual;
     const least = Math.max(all[0] ?? 0, -most);
     const step = roundStep(most - Math.min(least, 0));
     const isFalling = least < -0.02 * most;  // less is rounding

@@ -32,11 +32,13 @@ const sliceKinds = [
   })),
   isPair
     ? {
-        name: `Difference: white is ${brief(data.differenceFull)}`,
+        name: `Difference of the channel that differs most: white is ${brief(data.differenceFull)}`,
         bytes: (element) => heat(apart(lattices[0].colour(element), lattices[1].colour(element)) / data.differenceFull),
       }
     : {
-        name: "Without the table",
+        name: [0, 1].every((end, i) => [data.grid.min, data.grid.max][i].every((value) => value === end))
+          ? "Without the table"
+          : "Without the table: the domain from black to white",
         bytes: (element, place) => screenColour(place.map((value, c) => (value - data.grid.min[c]) / (data.grid.max[c] - data.grid.min[c]))),
       },
 ];

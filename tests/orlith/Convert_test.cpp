@@ -92,10 +92,20 @@ TEST_F(ConvertTest, SaysWhatIsLostAndResamplesAsItIsTold) {
     folder_.write("a.cube",
                   "LUT_3D_SIZE 2\n0 0 0\n1 0 0\n0 1 0\n1 1 0\n0 0 1\n1 0 1\n0 1 1\n"
                   "1 1 1.5\n");
+    // A pre-LUT that is a domain and no more.
+    folder_.write("d.csp",
+                  "CSPLUTV100\n3D\n\n2\n-8 8\n0 1\n2\n0 8\n0 1\n2\n0 8\n0 1\n\n2 2 2\n"
+                  "0 0 0\n1 0 0\n0 1 0\n1 1 0\n0 0 1\n1 0 1\n0 1 1\n1 1 1\n");
     expectAll({
+        {"convert d.csp d.cube", 0, "d.cube: .cube, 2 x 2 x 2 points, largest deviation 0\n", ""},
+        {"eval d.csp 16 4 4 --extrapolate", 0, "1.5 0.5 0.5\n", ""},
+        {"eval d.cube 0 12 4 --extrapolate", 0, "0.5 1.5 0.5\n", ""},
         {"convert a.cube o.3dl", 0,
          "o.3dl: .3dl, 2 x 2 x 2 points, largest deviation 0.5 (clipped: 1 numbers, the farthest"
          " 1.5)\n",
+         "Warning: Flame/Lustre prefers 3DL files of 17x17x17, 33x33x33, 65x65x65\n"},
+        {"convert a.cube o.3dl --quiet", 0, "",
+         "orlith: warning: o.3dl: clipped: 1 numbers, the farthest 1.5\n"
          "Warning: Flame/Lustre prefers 3DL files of 17x17x17, 33x33x33, 65x65x65\n"},
         {"convert a.cube o.cube --size 9", 0,
          "o.cube: .cube, 9 x 9 x 9 points, largest deviation 5.4e-07 (resampled for another"

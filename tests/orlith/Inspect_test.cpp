@@ -165,8 +165,7 @@ TEST_F(InspectTest, DiffComparesTables) {
         // Of other size: at the points of the larger, whichever comes first.
         {"diff curve2.cube curve3.cube --strict", 1, bent.c_str(), ""},
         {"diff curve3.cube curve2.cube --strict", 1, bent.c_str(), ""},
-        {"diff a.cube none", 1, "",
-         "orlith: error: none: No such file or directory\n"},
+        {"diff a.cube none", 1, "", "orlith: error: none: No such file or directory\n"},
     });
     // Looks: at the points of the larger and at random colours.
     const struct {

@@ -2,22 +2,70 @@
 
 #include <algorithm>
 #include <cmath>
+#include <optional>
 
 #include "lut/evaluation/Range.h"
 
 namespace Orlith::LUT {
 
-void dropIdentityPreLUT(LUT& lut) {
-    const Shaper* const shapers[] = {&lut.inputShaper, &lut.outputShaper};
-    for (const Shaper* const shaper : shapers) {
-        const auto& entries = shaper->entries;
-        if (entries.size() != 2) return;
-        for (unsigned c = 0; c < 3; ++c) {
-            if (shaper->counts[c] != 2.0F || entries[0][c] != 0.0F || entries[1][c] != 1.0F) return;
-        }
-    }
+namespace {
+
+/// What a shaper that is a straight line begins and ends with on a channel.
+struct Ends {
+    float first = 0.0F;
+    float last = 1.0F;
+
+    bool areUnit() const { return first == 0.0F && last == 1.0F; }
+    float length() const { return last - first; }
+};
+
+/// 0 and 1 where there is no shaper; nothing where it is no straight line upward.
+std::optional<Ends> endsOf(const Shaper& shaper, unsigned c) {
+    const auto& entries = shaper.entries;
+    if (entries.empty()) return Ends();
+    if (entries.size() != 2 || shaper.counts[c] != 2.0F) return std::nullopt;
+    const Ends ends{entries[0][c], entries[1][c]};
+    return ends.length() > 0.0F ? std::optional(ends) : std::nullopt;
+}
+
+void dropPreLUT(LUT& lut) {
     lut.inputShaper = {};
     lut.outputShaper = {};
+}
+
+}  // namespace
+
+void dropIdentityPreLUT(LUT& lut) {
+    for (unsigned c = 0; c < 3; ++c) {
+        for (const Shaper* const shaper : {&lut.inputShaper, &lut.outputShaper}) {
+            const auto ends = endsOf(*shaper, c);
+            if (!ends || !ends->areUnit()) return;
+        }
+    }
+    dropPreLUT(lut);
+}
+
+void foldStraightPreLUT(LUT& lut) {
+    if (lut.inputShaper.empty() && lut.outputShaper.empty()) return;
+    if (lut.is1D()) return dropIdentityPreLUT(lut);
+    const int sides[] = {lut.width(), lut.height(), lut.depth()};
+    Transform transform = lut.transform;
+    for (unsigned c = 0; c < 3; ++c) {
+        const auto inputs = endsOf(lut.inputShaper, c);
+        const auto points = endsOf(lut.outputShaper, c);
+        if (!inputs || !points || sides[c] < 2) return;
+        // One that stops within the lattice, or goes on beyond it, is more than a domain.
+        const float scale = lut.transform[c][c];
+        const float offset = lut.transform[3][c];
+        const auto cells = static_cast<float>(sides[c] - 1);
+        const float slack = 1e-6F * points->length();
+        if (!(std::fabs(points->first - offset) <= slack)) return;
+        if (!(std::fabs(points->last - (offset + scale * cells)) <= slack)) return;
+        transform[c][c] = inputs->length() / cells;
+        transform[3][c] = inputs->first;
+    }
+    lut.transform = transform;
+    dropPreLUT(lut);
 }
 
 Clipping clippingOf(const LUT& lut, const std::string& extension, const Options3DL& options) {

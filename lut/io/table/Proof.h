@@ -14,6 +14,10 @@ namespace Orlith::LUT {
 /// Takes a pre-LUT away that changes nothing, such as the one that a .csp file has to have.
 void dropIdentityPreLUT(LUT& lut);
 
+/// Makes a pre-LUT in front of a lattice its domain where it is no more than that: straight, from
+/// one end of the lattice to the other. Colours beyond it are then the lattice's to continue.
+void foldStraightPreLUT(LUT& lut);
+
 /// What the codes of a .3dl file do not reach.
 struct Clipping {
     std::uint64_t numberCount = 0;
