@@ -1,13 +1,18 @@
 #include "host/openimageio/Output.h"
 
 #include <OpenImageIO/filesystem.h>
+#include <fcntl.h>
+#include <unistd.h>
 
 #include <algorithm>
 #include <cerrno>
+#include <cstddef>
 #include <cstdio>
 #include <filesystem>
+#include <iterator>
 #include <string_view>
 #include <system_error>
+#include <vector>
 
 #include "host/Error.h"
 #include "host/openimageio/Codec.h"
@@ -38,11 +43,35 @@ bool mayReadBack(const OIIO::ImageOutput& format, const std::vector<OIIO::ImageS
            std::any_of(parts.begin(), parts.end(), hasMetadata);
 }
 
-/// Whether a file has so many parts: the directory that ends a TIFF file may not have arrived.
-bool hasParts(const std::string& path, int count) {
-    const auto input = OIIO::ImageInput::open(path);
-    OIIO::geterror();  // said otherwise
-    return input && input->seek_subimage(count - 1, 0);
+/// Has room made for a file whose format does not tell when there is none, which would be no error
+/// but lines of black.
+void reserve(const std::string& path, const std::vector<OIIO::ImageSpec>& parts) {
+    OIIO::imagesize_t byteCount = 65536;  // what stands around the pixels
+    for (const OIIO::ImageSpec& part : parts)
+        byteCount += part.image_bytes(true);
+    const int file = ::open(path.c_str(), O_WRONLY | O_CREAT | O_TRUNC, 0666);
+    if (file < 0) throw Error(path, std::generic_category().message(errno));
+    const int error = posix_fallocate(file, 0, static_cast<off_t>(byteCount));
+    ::close(file);
+    if (error == ENOSPC || error == EFBIG || error == EDQUOT) throw Error(path, kNotWhole);
+}
+
+/// Formats whose files are as they were asked for where every byte has arrived. Others may write
+/// what cannot be read, such as an image wider than their headers tell.
+bool isDependableFormat(std::string_view format) {
+    constexpr std::string_view kFormats[] = {"openexr", "tiff",  "dpx", "png", "jpeg",
+                                             "hdr",     "targa", "pnm", "bmp"};
+    return std::find(std::begin(kFormats), std::end(kFormats), format) != std::end(kFormats);
+}
+
+bool hasLines(OIIO::ImageInput& input) {
+    const OIIO::ImageSpec& spec = input.spec();
+    std::vector<std::byte> line(spec.scanline_bytes(true));
+    if (spec.tile_width != 0) return true;
+    for (int y = spec.y; y < spec.y + spec.height; ++y) {
+        if (!input.read_scanline(y, spec.z, OIIO::TypeUnknown, line.data())) return false;
+    }
+    return true;
 }
 
 }  // namespace
@@ -82,12 +111,14 @@ public:
     }
 
     /// The format is done.
-    void finish() {
+    void close() {
         proxy_.reset();
         expectTaken();
         if (file_ && std::fclose(file_.release()) != 0) throw Error(path_, kNotWhole);
-        isFinished_ = true;
     }
+
+    /// The file is good, and stays.
+    void keep() { isFinished_ = true; }
 
 private:
     struct Close {
@@ -105,14 +136,25 @@ Output::Output(const std::string& path)
       file_(std::make_unique<OutputFile>(path)),
       format_(OIIO::ImageOutput::create(path)) {
     if (!format_) fail(path_, OIIO::geterror(), "cannot be written");
+    // Two keep no image; of the third the library reads beyond the end.
+    const std::string_view format = format_->format_name();
+    if (format == "term" || format == "null" || format == "ico") {
+        throw Error(path_, "is of a kind that is not written");
+    }
 }
 
 Output::~Output() = default;
 
 void Output::open(const std::vector<OIIO::ImageSpec>& parts) {
+    first_ = parts.front();
     partCount_ = static_cast<int>(parts.size());
-    readsBack_ = mayReadBack(*format_, parts);
-    if (format_->supports("ioproxy") && !readsBack_) format_->set_ioproxy(file_->open());
+    expectSize(first_);
+    if (format_->supports("ioproxy") && !mayReadBack(*format_, parts)) {
+        format_->set_ioproxy(file_->open());
+    } else if (!format_->supports("ioproxy")) {
+        file_->started();
+        reserve(path_, parts);
+    }
     // Some formats want to know all parts first; others have no such call.
     expectWritten(parts.size() == 1
                       ? format_->open(path_, parts.front())
@@ -130,10 +172,35 @@ void Output::expectWritten(bool isGood) const {
     fail(path_, format_->geterror(), "cannot be written");
 }
 
+void Output::expectSize(const OIIO::ImageSpec& spec) const {
+    // The JPEG library would end the program.
+    constexpr int kMostOfJPEG = 65500;
+    if (format_->format_name() == std::string_view("jpeg") &&
+        std::max(spec.width, spec.height) > kMostOfJPEG) {
+        throw Error(path_, "a JPEG file has at most " + std::to_string(kMostOfJPEG) +
+                               " pixels in a line and as many lines");
+    }
+}
+
+/// The directory that ends a TIFF file may not have arrived; and see isDependableFormat.
+void Output::expectReadable() const {
+    if (!fs::is_regular_file(path_)) return;
+    const bool isDependable = isDependableFormat(format_->format_name());
+    const auto input = OIIO::ImageInput::open(path_);
+    const bool isSame =
+        input && input->spec().width == first_.width && input->spec().height == first_.height &&
+        (isDependable || hasLines(*input)) && input->seek_subimage(partCount_ - 1, 0);
+    OIIO::geterror();  // said otherwise
+    if (input) input->geterror();
+    if (isSame) return;
+    throw Error(path_, isDependable ? kNotWhole : "its format does not hold such an image");
+}
+
 void Output::finish() {
     expectWritten(format_->close());
-    if (readsBack_ && !hasParts(path_, partCount_)) throw Error(path_, kNotWhole);
-    file_->finish();
+    file_->close();
+    expectReadable();
+    file_->keep();
 }
 
 }  // namespace host::openimageio

@@ -41,9 +41,12 @@ public:
     void finish();
 
 private:
+    void expectSize(const OIIO::ImageSpec& spec) const;
+    void expectReadable() const;
+
     const std::string path_;
+    OIIO::ImageSpec first_;
     int partCount_ = 0;
-    bool readsBack_ = false;  // the format, what it has written
     std::unique_ptr<OutputFile> file_;
     std::unique_ptr<OIIO::ImageOutput> format_;  // uses the file to its own end
 };

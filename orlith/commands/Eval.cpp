@@ -71,6 +71,7 @@ void evaluateInput(const ColourWay& way) {
         if (isWaitedFor) std::fflush(stdout);
     }
     evaluate(way, colours);
+    if (std::cin.bad()) throw Failure("standard input cannot be read");
 }
 
 int runEval(const EvalOptions& options) {

@@ -7,6 +7,7 @@
 #include <filesystem>
 #include <fstream>
 #include <string>
+#include <system_error>
 #include <vector>
 
 #include "orlith/Command.h"
@@ -41,6 +42,15 @@ struct ViewOptions {
 std::string pageName(const ViewOptions& options) {
     if (!options.output.empty()) return options.output;
     return options.a == "-" ? "table.html" : fs::path(options.a).stem().string() + ".html";
+}
+
+void expectOtherFile(const std::string& page, const ViewOptions& options) {
+    for (const std::string& shown : {options.a, options.b, options.image}) {
+        std::error_code ignored;
+        if (fs::equivalent(page, shown, ignored)) {
+            throw Failure(fmt::format("{}: is shown, so it cannot be the page", page));
+        }
+    }
 }
 
 report::PageTable pageTable(const std::string& path, const ViewOptions& options) {
@@ -119,6 +129,7 @@ int runView(const ViewOptions& options) {
     if (options.a == "-" && options.b == "-") {
         throw UsageError("only one of the tables can come from standard input");
     }
+    expectOtherFile(pageName(options), options);
     std::vector<report::PageTable> tables = {pageTable(options.a, options)};
     if (!options.b.empty()) tables.push_back(pageTable(options.b, options));
 

@@ -321,9 +321,11 @@ TEST_F(ImageFileTest, LeavesNothingBehindWhenWritingFails) {
     EXPECT_FALSE(std::filesystem::exists(path));
     host::Host::clearCancel();
 
-    const std::string unknown = folder_.path("pattern.xyz");
-    EXPECT_NE(failureOf([&] { host::writeImage(unknown, *node.image()); }), "");
-    EXPECT_FALSE(std::filesystem::exists(unknown));
+    for (const char* const name : {"pattern.xyz", "pattern.ico", "pattern.null", "pattern.term"}) {
+        const std::string unknown = folder_.path(name);
+        EXPECT_NE(failureOf([&] { host::writeImage(unknown, *node.image()); }), "");
+        EXPECT_FALSE(std::filesystem::exists(unknown));
+    }
 }
 
 #ifdef __linux__

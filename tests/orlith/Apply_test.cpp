@@ -338,6 +338,7 @@ TEST_F(ApplyTest, RefusesWhatCannotBeDone) {
     write("good.exr", {specOf({"R", "G", "B"}, "half", 300, 300)});
     folder_.write("cut.exr", read("good.exr").substr(0, read("good.exr").size() / 2));
     folder_.write("bad.cube", "LUT_3D_SIZE 2\n0 0 0\n");
+    write("wide.tif", {specOf({"R", "G", "B"}, "uint8", 70000, 1)});
     const struct {
         const char *command, *error;
     } kCases[] = {
@@ -351,6 +352,9 @@ TEST_F(ApplyTest, RefusesWhatCannotBeDone) {
          "o.png: .png files hold uint8, uint16, not half"},
         {"cut.exr o.exr --lut look.cube", "cut.exr: "},
         {"good.exr o.xyz --lut look.cube", "o.xyz: "},
+        // Wider than the headers can say, and than the library bears.
+        {"wide.tif o.gif --lut look.cube --quiet", "o.gif: its format does not hold such an image"},
+        {"wide.tif o.jpg --lut look.cube", "o.jpg: a JPEG file has at most 65500 pixels"},
     };
     for (const auto& each : kCases) {
         const test::Outcome outcome = run("apply " + std::string(each.command));
@@ -359,7 +363,7 @@ TEST_F(ApplyTest, RefusesWhatCannotBeDone) {
         EXPECT_EQ(outcome.err.substr(0, start.size()), start);
         EXPECT_EQ(outcome.err.find('\n'), outcome.err.size() - 1) << outcome.err;
     }
-    EXPECT_EQ(std::distance(fs::directory_iterator(folder_.path("")), {}), 6);
+    EXPECT_EQ(std::distance(fs::directory_iterator(folder_.path("")), {}), 7);
 }
 
 TEST_F(ApplyTest, RunsOverTheFramesOfASequence) {

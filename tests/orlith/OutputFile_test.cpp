@@ -65,6 +65,9 @@ TEST_F(OutputFileTest, WhatCannotBeWrittenWholeLeavesTheOldFile) {
         {"ulimit -f 40; $ORLITH convert big.cube old.csp", "old.csp",
          "not all of the file could be written (File too large)\n"},
         {"ulimit -f 2; $ORLITH pattern old.tif --size 17", "old.tif", ""},
+        // The format's writer does not look.
+        {"ulimit -f 2; $ORLITH pattern old.sgi --size 17", "old.sgi", "cannot be written whole"},
+        {"$ORLITH view a.cube --output a.cube", "a.cube", "is shown"},
         {"ulimit -f 40; $ORLITH generate p.exr old.cms --lut1d 9000", "old.cms",
          "Error writing LUT file: not all of the file could be written (File too large)\n"},
         {"$ORLITH convert a.cube full.cube", "full.cube", "No space left on device"},
@@ -85,7 +88,7 @@ TEST_F(OutputFileTest, WhatCannotBeWrittenWholeLeavesTheOldFile) {
             EXPECT_EQ(read(file), "precious") << each.command;
         }
     }
-    EXPECT_EQ(fileCount(), 11);
+    EXPECT_EQ(fileCount(), 12);
 }
 
 TEST_F(OutputFileTest, FollowsLinksAndKeepsPermissions) {
