@@ -76,10 +76,11 @@ struct AppliedTable {
     void apply(float* rgb, std::size_t colourCount) {
         std::uint64_t outside = 0;
         for (const float* each = rgb; each != rgb + 3 * colourCount; each += 3) {
-            bool isInside = true;  // NaN is not
+            int kept =
+                0;  // channels within, which NaN is not; without branches, which would cost more
             for (unsigned c = 0; c < 3; ++c)
-                isInside = isInside & (inputs.min[c] <= each[c]) & (each[c] <= inputs.max[c]);
-            outside += isInside ? 0 : 1;
+                kept += int(inputs.min[c] <= each[c]) & int(each[c] <= inputs.max[c]);
+            outside += kept == 3 ? 0 : 1;
         }
         outsideCount += outside;
         way(rgb, colourCount);
