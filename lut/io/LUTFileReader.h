@@ -38,7 +38,10 @@ public:
     /// Options of the format. A name that is taken keeps its property; the result says so by false.
     ///
     /// All formats know "interchange" (Int, 0 when absent): 0 goes by the letter of the format, 1
-    /// takes what other programs write and gives the table that they mean by it.
+    /// takes what other programs write and gives the table that they mean by it. And "fileOrder"
+    /// (Int, 0 when absent): 1 lets the samples of a table that the file does not fill stand as
+    /// they came, for those who look at none of them. Strewn over a huge lattice few take much
+    /// memory.
     bool setProperty(const std::string& name, const boost::shared_ptr<Property::Base>& property) {
         return properties_.insert(name, property);
     }
@@ -63,8 +66,11 @@ protected:
     const Property::PropertySet& properties() const { return properties_; }
 
     /// The value of "interchange".
-    bool isInterchange() const {
-        const auto property = properties_.find("interchange");
+    bool isInterchange() const { return isSet("interchange"); }
+
+    /// Whether a property is an Int other than 0.
+    bool isSet(const char* name) const {
+        const auto property = properties_.find(name);
         const auto* flag = Property::asInt(property.get(), 1);
         return flag != nullptr && flag->values[0] != 0;
     }

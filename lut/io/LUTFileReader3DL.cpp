@@ -289,7 +289,8 @@ boost::shared_ptr<LUT> LUTFileReader3DL::read(const std::string& filename) {
         // Before few samples are strewn over the memory of many.
         meant.finish(*lut_, lines);
         if (factor != 1.0F) multiply(*lut_, sampleCount_, factor);
-        placeBlueFastest(*lut_, sampleCount_);
+        const bool isFilled = sampleCount_ >= LatticeSize::of(*lut_).pointCount();
+        if (isFilled || !isSet("fileOrder")) placeBlueFastest(*lut_, sampleCount_);
         setDomain(*lut_, grid);
         return lut_;
     });

@@ -173,7 +173,9 @@ Table readAsFarAsItGoes(const std::string& path, const ReadOptions& options) {
 }
 
 int runInfo(const InfoOptions& options) {
-    const Table table = readAsFarAsItGoes(options.path, options.reading);
+    ReadOptions reading = options.reading;
+    reading.placesFewSamples = options.showsValues;
+    const Table table = readAsFarAsItGoes(options.path, reading);
     if (options.showsValues && table.pointCount > kMostValues) {
         throw Failure(fmt::format("{}: {} points are too many for --values (at most {})",
                                   table.name, table.pointCount, kMostValues));

@@ -21,6 +21,8 @@ void setReaderProperties(LUTFileReader& reader, const ReadOptions& options) {
     const auto set = [&](const char* name, auto property) { reader.setProperty(name, property); };
     set("interchange",
         property::makeProperty<property::Int>("interchange", options.isStrict ? 0 : 1));
+    set("fileOrder",
+        property::makeProperty<property::Int>("fileOrder", options.placesFewSamples ? 0 : 1));
     set("format3DL", property::makeProperty<property::String>("format3DL", options.format3DL));
     set("outputBitDepth",
         property::makeProperty<property::Int>("outputBitDepth", options.outputBitDepth));

@@ -16,6 +16,7 @@ struct ReadOptions {
     std::string format3DL = "auto";
     int outputBitDepth = kDetect;
     bool normalizeOutput = false;
+    bool placesFewSamples = true;  ///< also those of a table that the file does not fill
 
     static constexpr int kDetect = -2;
     static constexpr int kAsInput = -1;

@@ -68,6 +68,8 @@ TEST(Memory, IsInProportionToWhatAFileHolds) {
          vf + "grid_size 1000 900 800\ndata\n" + repeated(20000, "1 1 1\n")},
         // Each would be 1.4 GiB, if the samples that the file does not hold were touched.
         {"codes of 4 bits, as is known at the end", ".3dl", grid + "\n1 2 3\n", true},
+        {"few samples of a huge lattice", ".3dl", grid + "\n" + repeated(20000, "65535 1 2\n"),
+         true},
         {"a lattice without samples", ".cms", "LUT_3D_SIZE 500\n", true},
         {"a sample of many", ".csp", csp + "500 500 500\n0 0 0\n"},
         {"no points, as one side has none", ".csp", csp + "2147483647 0 2147483647\n", true},
@@ -82,6 +84,8 @@ TEST(Memory, IsInProportionToWhatAFileHolds) {
         const std::string path = folder.write("file", file.bytes);
         const auto reader = ol::createReader("", true, file.extension);
         Reading3DL{}(*reader);
+        reader->setProperty("fileOrder",
+                            Orlith::Property::makeProperty<Orlith::Property::Int>("fileOrder", 1));
         malloc_trim(0);                               // what was freed is not there
         std::ofstream("/proc/self/clear_refs") << 5;  // forgets the peak
         const std::size_t before = statusBytes("VmRSS:");
