@@ -58,7 +58,7 @@ Input::Input(const std::string& path) : path_(path) {
     wishes["oiio:UnassociatedAlpha"] = 1;
     image_ = OIIO::ImageInput::open(path_, &wishes);
     if (!image_) failReading(path_, OIIO::geterror());
-    // The library reads beyond the end of its pixels.
+    // The library damages memory with some of these files, such as its own.
     if (formatName() == "ico") throw Error(path_, "is of a kind that is not read");
     if (!hasEnd(path_, formatName())) throw Error(path_, "is cut off");
     if (formatName() != "dpx") return;

@@ -136,7 +136,7 @@ Output::Output(const std::string& path)
       file_(std::make_unique<OutputFile>(path)),
       format_(OIIO::ImageOutput::create(path)) {
     if (!format_) fail(path_, OIIO::geterror(), "cannot be written");
-    // Two keep no image; of the third the library reads beyond the end.
+    // Two keep no image; the third is not read, see Input.
     const std::string_view format = format_->format_name();
     if (format == "term" || format == "null" || format == "ico") {
         throw Error(path_, "is of a kind that is not written");

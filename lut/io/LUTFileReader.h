@@ -38,10 +38,10 @@ public:
     /// Options of the format. A name that is taken keeps its property; the result says so by false.
     ///
     /// All formats know "interchange" (Int, 0 when absent): 0 goes by the letter of the format, 1
-    /// takes what other programs write and gives the table that they mean by it. And "fileOrder"
-    /// (Int, 0 when absent): 1 lets the samples of a table that the file does not fill stand as
-    /// they came, for those who look at none of them. Strewn over a huge lattice few take much
-    /// memory.
+    /// takes what other programs write and gives the table that they mean by it. ".3dl" files, of
+    /// which any beginning may be a table, know "fileOrder" as well (Int, 0 when absent): 1 lets
+    /// the samples of a table that is not filled stand as they came, for those who look at none of
+    /// them. Strewn over a huge lattice few take much memory.
     bool setProperty(const std::string& name, const boost::shared_ptr<Property::Base>& property) {
         return properties_.insert(name, property);
     }
