@@ -16,8 +16,7 @@ namespace Orlith::LUT {
 using LatticeVectorMethod = void (*)(const PaddedLattice& lattice, const Placement& placement,
                                      const float* points, float* results, std::size_t count);
 
-/// In the order of Evaluator::Method. The cubic method needs an extrapolated border, the others one
-/// of nearest samples.
+/// In the order of Evaluator::Method. The cubic method takes Lines, the others Samples.
 using LatticeVectors = std::array<LatticeVectorMethod, 5>;
 
 /// Samples beyond this, and what is no number, are not for the cubic method in vectors: it skips

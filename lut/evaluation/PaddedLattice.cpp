@@ -1,6 +1,8 @@
 #include "lut/evaluation/PaddedLattice.h"
 
+#include <algorithm>
 #include <new>
+#include <vector>
 
 namespace Orlith::LUT {
 namespace {
@@ -8,8 +10,7 @@ namespace {
 constexpr int kBelow = 1;
 constexpr int kAbove = 2;
 
-/// A whole vector is loaded where the last sample is.
-constexpr std::size_t kSlack = 16;
+constexpr std::size_t kSamplesInLine = 5;
 
 std::size_t paddedSide(const Lattice& lattice, unsigned axis) {
     return static_cast<std::size_t>(lattice.last(axis)) + 1 + kBelow + kAbove;
@@ -17,34 +18,48 @@ std::size_t paddedSide(const Lattice& lattice, unsigned axis) {
 
 }  // namespace
 
-std::size_t PaddedLattice::floatCount(const Lattice& lattice) {
+std::size_t PaddedLattice::sampleCount(const Lattice& lattice) {
     // Three sides of 31 bits do not fit; two and the bound do.
     const std::size_t plane = paddedSide(lattice, 0) * paddedSide(lattice, 1);
-    return plane > kMostFloats ? plane : plane * paddedSide(lattice, 2) * 4;
+    return plane > kMostSamples ? plane : plane * paddedSide(lattice, 2);
 }
 
-PaddedLattice::PaddedLattice(const Lattice& lattice, Border border)
-    : floats_(hwy::AllocateAligned<float>(floatCount(lattice) + kSlack)), first_(floats_.get()) {
+PaddedLattice::PaddedLattice(const Lattice& lattice, Layout layout) {
+    const bool inLines = layout == Layout::Lines;
+    const std::size_t samples = paddedSide(lattice, 1);
+    // A unit is a sample, or a line. The last line begins with the last sample's lower neighbour or
+    // with the one below that.
+    const std::size_t units = inLines ? static_cast<std::size_t>(lattice.last(1)) / 2 + 1 : samples;
+    const std::size_t unit = inLines ? kFloatsInLine : kFloatsInSample;
+    const std::size_t samplesInUnit = inLines ? kSamplesInLine : 1;
+    const std::size_t row = units * unit;
+    const std::size_t plane = row * paddedSide(lattice, 0);
+    const std::size_t size = plane * paddedSide(lattice, 2);
+    floats_ = hwy::AllocateAligned<float>(size);
     if (!floats_) throw std::bad_alloc();
-    const auto sample = [&](int r, int g, int b) {
-        if (border == Border::Extrapolated) return extrapolatedSample(lattice, r, g, b);
-        return RGB(lattice.sample(lattice.clamp(0, r), lattice.clamp(1, g), lattice.clamp(2, b)));
-    };
+    std::fill_n(floats_.get(), size, 0.0F);
+
+    // One more, for a line that ends behind the row.
+    std::vector<RGB> along(samples + 1, RGB(0.0F, 0.0F, 0.0F));
     float* place = floats_.get();
     for (int b = -kBelow; b <= lattice.last(2) + kAbove; ++b) {
         for (int r = -kBelow; r <= lattice.last(0) + kAbove; ++r) {
-            for (int g = -kBelow; g <= lattice.last(1) + kAbove; ++g, place += 4) {
-                sample(r, g, b).copy_out(place);
-                place[3] = 0.0F;
+            for (int g = -kBelow; g <= lattice.last(1) + kAbove; ++g) {
+                along[static_cast<std::size_t>(g + kBelow)] =
+                    inLines ? extrapolatedSample(lattice, r, g, b)
+                            : RGB(lattice.sample(lattice.clamp(0, r), lattice.clamp(1, g),
+                                                 lattice.clamp(2, b)));
+            }
+            for (std::size_t i = 0; i < units; ++i, place += unit) {
+                const RGB* const first = &along[inLines ? 2 * i : i];
+                for (std::size_t k = 0; k < samplesInUnit; ++k)
+                    first[k].copy_out(place + 3 * k);
             }
         }
     }
-    std::fill_n(place, kSlack, 0.0F);
-    strides_[1] = 4;
-    strides_[0] = strides_[1] * static_cast<std::int32_t>(paddedSide(lattice, 1));
-    strides_[2] = strides_[0] * static_cast<std::int32_t>(paddedSide(lattice, 0));
-    for (const std::int32_t stride : strides_)
-        first_ += std::ptrdiff_t{kBelow} * stride;
+    strides_ = {static_cast<std::int32_t>(row), static_cast<std::int32_t>(unit),
+                static_cast<std::int32_t>(plane)};
+    first_ = floats_.get() + kBelow * (plane + row + (inLines ? 0 : unit));
 }
 
 }  // namespace Orlith::LUT

@@ -75,8 +75,8 @@ public:
                     Outside outside)
         : table_(table),
           preLUT_(std::move(preLUT)),
-          lattice_(lattice, method == Method::Cubic ? PaddedLattice::Border::Extrapolated
-                                                    : PaddedLattice::Border::Nearest),
+          lattice_(lattice, method == Method::Cubic ? PaddedLattice::Layout::Lines
+                                                    : PaddedLattice::Layout::Samples),
           placement_(table),
           method_(static_cast<std::size_t>(method)),
           outside_(outside) {
@@ -161,7 +161,7 @@ bool suitsCubicVectors(const LUT& table) {
 std::unique_ptr<const PreparedTable> prepareLattice(const LUT& table, PreLUT preLUT, Method method,
                                                     Outside outside) {
     const Lattice lattice(table);
-    if (PaddedLattice::floatCount(lattice) > PaddedLattice::kMostFloats) return nullptr;
+    if (PaddedLattice::sampleCount(lattice) > PaddedLattice::kMostSamples) return nullptr;
     if (method == Method::Cubic && !suitsCubicVectors(table)) return nullptr;
     return std::make_unique<PreparedLattice>(table, std::move(preLUT), lattice, method, outside);
 }

@@ -121,9 +121,10 @@ constexpr Domain kDomains[] = {
 };
 
 /// What stands in a table: random numbers; some of them none, or at the ends of what there is;
-/// numbers whose double or sum may be beyond it; only zeros, with their sign.
-enum class Samples { Random, Odd, Huge, NegativeZeros };
-constexpr Samples kSamples[] = {Samples::Random, Samples::Odd, Samples::Huge,
+/// numbers whose double or sum may be beyond it; some whose half is no number; only zeros, with
+/// their sign.
+enum class Samples { Random, Odd, Huge, Tiny, NegativeZeros };
+constexpr Samples kSamples[] = {Samples::Random, Samples::Odd, Samples::Huge, Samples::Tiny,
                                 Samples::NegativeZeros};
 
 void fill(ol::LUT& lut, Samples samples) {
@@ -135,6 +136,7 @@ void fill(ol::LUT& lut, Samples samples) {
         if (samples == Samples::Huge) {
             lut.data()[i] = i % 97 == 0 ? 1.8e38F : random() % 2 == 0 ? 2e37F : -3e37F;
         }
+        if (samples == Samples::Tiny) lut.data()[i] = float(random() % 8) * 0x1p-149F;
         if (samples == Samples::Odd && i % 11 == 0) lut.data()[i] = kOdd[i % std::size(kOdd)];
     }
 }
