@@ -10,9 +10,9 @@ py::array toNumbers(const py::object& given, const std::string& name) {
     }
     auto array = py::reinterpret_borrow<py::array>(given);
     const char kind = array.dtype().kind();
-    if (kind != 'f' || (array.itemsize() != 4 && array.itemsize() != 8)) {
+    if (kind != 'f' || array.itemsize() > 8) {
         const bool isCode = kind == 'i' || kind == 'u';
-        throw py::type_error(name + " have to be float32 or float64, not " +
+        throw py::type_error(name + " have to be float16, float32 or float64, not " +
                              std::string(py::str(array.dtype())) +
                              (isCode ? ": divide codes by the largest" : ""));
     }

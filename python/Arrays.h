@@ -15,7 +15,7 @@ using Shape = std::vector<pybind11::ssize_t>;
 
 /// What was given as an array of numbers. Lists and the like count as float64.
 /// @param name  of the argument, for the error
-/// @throws pybind11::type_error  an array that is neither float32 nor float64
+/// @throws pybind11::type_error  an array of other numbers than float16, float32 and float64
 pybind11::array toNumbers(const pybind11::object& given, const std::string& name);
 
 Shape shapeOf(const pybind11::array& array);

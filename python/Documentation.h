@@ -7,7 +7,7 @@ namespace python {
 inline constexpr char kTableText[] =
     R"(A look-up table: a curve (kind "1D") or a lattice (kind "3D") of colours.
 
-Table(samples, domain=None) makes one from an array of float32 or float64, which is copied: (N, 3)
+Table(samples, domain=None) makes one from an array of floats, which is copied: (N, 3)
 for a curve, (R, G, B, 3) for a lattice. domain is what the first and the last point stand for: two
 numbers or two triples; None is 0 to 1.
 
@@ -33,7 +33,7 @@ inline constexpr char kCallText[] = R"(__call__(self, colours, mode="trilinear",
 
 Sends colours through the table and returns new ones of the same shape.
 
-colours      (..., 3), of any shape and strides: float32 gives float32, float64 gives float64;
+colours      (..., 3), of any shape and strides: float16, float32 and float64 give their own type;
              computed in single precision
 mode         "step", "staggered", "trilinear", "tetrahedral" or "cubic"; curves ignore it
 extrapolate  beyond the domain: True goes on in straight lines, False stays at its edge
@@ -105,8 +105,8 @@ inline constexpr char kFromPatternText[] = R"(from_pattern(image)
 
 The table that a processed pattern holds: the centre of each patch, as it is.
 
-image  (height, width, 3) or more channels, of which the first three count; float32 or float64, its
-       top line first
+image  (height, width, 3) or more channels, of which the first three count; floats, its top
+       line first
 
 Whether the pattern is upright and its patches are flat is not looked at, as "orlith generate" does.
 TypeError, ValueError: another type, a size that no pattern has.)";

@@ -19,6 +19,7 @@
 #include "python/Errors.h"
 #include "python/Files.h"
 #include "python/Pattern.h"
+#include "python/State.h"
 #include "python/Tables.h"
 #include "python/Text.h"
 
@@ -162,6 +163,7 @@ void defineTable(py::module_& module) {
              py::arg("clamp_output") = true, py::arg("format_3dl") = "flame",
              py::arg("scale") = py::none(), py::arg("offset") = py::none())
         .def("__repr__", &describe)
+        .def(py::pickle([](const Table& self) { return stateOf(self); }, &tableOfState))
         .def_property_readonly("kind", &kindOf, "\"1D\": a curve; \"3D\": a lattice.")
         .def_property_readonly("size", &sizeOf,
                                "Points along red, green and blue; of a curve (N,).")

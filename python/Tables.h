@@ -12,8 +12,13 @@ namespace python {
 
 using Orlith::LUT::Table;
 
+/// A new table, all black, and without a domain.
+/// @param sides  points along each axis: one number for a curve, three for a lattice
+/// @throws pybind11::value_error  more points than a table has
+Table emptyTable(const Shape& sides);
+
 /// A new table, all black.
-/// @param sides   points along each axis: one number for a curve, three for a lattice
+/// @param sides   as of emptyTable
 /// @param domain  None for 0 to 1; otherwise what broadcasts to (2, 3) when there are two numbers,
 ///                or two triples: least and largest inputs
 /// @throws pybind11::value_error  fewer than two points a side, a domain that does not rise

@@ -33,6 +33,10 @@ class Table:
     ) -> _Floats: ...
     @overload
     def __call__(
+        self, colours: NDArray[numpy.float16], mode: _Mode = "trilinear", extrapolate: bool = False
+    ) -> NDArray[numpy.float16]: ...
+    @overload
+    def __call__(
         self, colours: ArrayLike, mode: _Mode = "trilinear", extrapolate: bool = False
     ) -> NDArray[numpy.float64]: ...
     def write(
