@@ -14,6 +14,7 @@
 #include <vector>
 
 #include "host/Host.h"
+#include "lut/io/table/Replacement.h"
 #include "orlith/Command.h"
 
 namespace orlith {
@@ -106,10 +107,8 @@ OutputFile::OutputFile(const std::string& path) : name_(path == "-" ? "standard 
     if (isStream_) {
         folder = fs::temp_directory_path(ignored);
     } else {
-        if (!file.has_filename() || fs::is_directory(file, ignored)) fail(EISDIR);
         if (fs::is_symlink(file, ignored)) fail(ELOOP);  // links without end
-        // Else a folder that may be written would let a file be replaced that may not.
-        if (fs::exists(file, ignored) && access(target_.c_str(), W_OK) != 0) fail(errno);
+        if (const int error = Orlith::LUT::whyNotReplaceable(file); error != 0) fail(error);
     }
     makeStage(folder, path == "-" ? "stdout" : file.filename().string());
 }
@@ -181,18 +180,8 @@ void OutputFile::copyToStream() const {
 }
 
 void OutputFile::replaceTarget() {
-    {
-        const Descriptor staged(::open(stagedPath_.c_str(), O_RDONLY | O_CLOEXEC));
-        if (staged.get() < 0) fail(errno);
-        struct stat before {};
-        if (stat(target_.c_str(), &before) == 0) {
-            fchmod(staged.get(), before.st_mode & 07777U);
-            // Where that is not allowed the new file is the user's own.
-            static_cast<void>(fchown(staged.get(), before.st_uid, before.st_gid) == 0);
-            // The old file goes only when the new one is on the disk.
-            if (fsync(staged.get()) != 0 && errno != EINVAL) fail(errno);
-        }
-    }
+    const int error = Orlith::LUT::prepareReplacement(stagedPath_, target_);
+    if (error != 0) fail(error);
     if (!scope_.close()) throw Cancelled();
     if (std::rename(stagedPath_.c_str(), target_.c_str()) != 0) fail(errno);
 }

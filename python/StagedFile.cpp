@@ -1,13 +1,12 @@
 #include "python/StagedFile.h"
 
-#include <unistd.h>
-
 #include <cerrno>
 #include <cstdio>
 #include <cstdlib>
 #include <system_error>
 
 #include "lut/io/table/FileError.h"
+#include "lut/io/table/Replacement.h"
 
 namespace python {
 
@@ -17,13 +16,12 @@ StagedFile::StagedFile(const std::string& path) : name_(path), stagedPath_(path)
     std::error_code failure;
     target_ = fs::weakly_canonical(path, failure);
     if (failure) fail(failure.value());
-    const fs::file_status status = fs::status(target_, failure);
-    const bool isThere = fs::exists(status);
     if (path.empty()) fail(ENOENT);
-    if (fs::is_directory(status) || !fs::path(path).has_filename()) fail(EISDIR);
-    // Else a folder that may be written would let a file be replaced that may not.
-    if (isThere && access(target_.c_str(), W_OK) != 0) fail(errno);
-    if (isThere && !fs::is_regular_file(status)) return;
+    // A folder's name may end in a slash, which the target's does not.
+    if (!fs::path(path).has_filename()) fail(EISDIR);
+    if (const int error = Orlith::LUT::whyNotReplaceable(target_); error != 0) fail(error);
+    const fs::file_status status = fs::status(target_, failure);
+    if (fs::exists(status) && !fs::is_regular_file(status)) return;
 
     std::string folder = (target_.parent_path() / ".orlith-XXXXXX").string();
     if (mkdtemp(folder.data()) == nullptr) fail(errno);
@@ -38,9 +36,8 @@ StagedFile::~StagedFile() {
 
 void StagedFile::deliver() {
     if (isStream()) return;
-    std::error_code failure;
-    const fs::file_status before = fs::status(target_, failure);
-    if (fs::exists(before)) fs::permissions(stagedPath_, before.permissions(), failure);
+    const int error = Orlith::LUT::prepareReplacement(stagedPath_, target_);
+    if (error != 0) fail(error);
     if (std::rename(stagedPath_.c_str(), target_.c_str()) != 0) fail(errno);
 }
 
