@@ -163,7 +163,8 @@ void defineTable(py::module_& module) {
              py::arg("clamp_output") = true, py::arg("format_3dl") = "flame",
              py::arg("scale") = py::none(), py::arg("offset") = py::none())
         .def("__repr__", &describe)
-        .def(py::pickle([](const Table& self) { return stateOf(self); }, &tableOfState))
+        .def("__reduce__", &partsOf, "What copies and pickles are made of.")
+        .def("_restore", &restore, py::arg("state"), "Takes what __reduce__ has beside samples.")
         .def_property_readonly("kind", &kindOf, "\"1D\": a curve; \"3D\": a lattice.")
         .def_property_readonly("size", &sizeOf,
                                "Points along red, green and blue; of a curve (N,).")

@@ -17,8 +17,8 @@ namespace {
 namespace py = pybind11;
 namespace ol = Orlith::LUT;
 
-/// Samples, the domain's steps and first inputs, two shapers, remarks.
-constexpr std::size_t kParts = 5;
+/// The domain's steps and first inputs, two shapers, remarks.
+constexpr std::size_t kParts = 4;
 
 [[noreturn]] void refuse() {
     throw py::value_error("this is no state of a Table");
@@ -54,41 +54,43 @@ ol::Shaper toShaper(const py::handle& state) {
 
 }  // namespace
 
-py::tuple stateOf(const Table& table) {
-    const ol::LUT& lut = *table.lut;
-    ol::RGB scale;
-    ol::RGB offset;
+py::tuple partsOf(const py::object& table) {
+    const auto& given = table.cast<const Table&>();
+    const ol::LUT& lut = *given.lut;
+    ol::RGB step;
+    ol::RGB first;
     for (unsigned c = 0; c < 3; ++c) {
-        scale[c] = lut.transform[c][c];
-        offset[c] = lut.transform[3][c];
+        step[c] = lut.transform[c][c];
+        first[c] = lut.transform[3][c];
     }
     py::list remarks;
     // Bytes: a file may say anything.
-    for (const ol::Remark& remark : table.remarks)
+    for (const ol::Remark& remark : given.remarks)
         remarks.append(py::make_tuple(remark.line, py::bytes(remark.text)));
-    return py::make_tuple(samplesOf(table, py::none()).attr("copy")("K"), toRows({scale, offset}),
-                          stateOf(lut.inputShaper), stateOf(lut.outputShaper), remarks);
+    const py::tuple state = py::make_tuple(toRows({step, first}), stateOf(lut.inputShaper),
+                                           stateOf(lut.outputShaper), remarks);
+    return py::make_tuple(
+        py::module_::import("orlith").attr("_restored"),
+        py::make_tuple(table.get_type(), table.attr("samples").attr("copy")("K"), state));
 }
 
-Table tableOfState(const py::tuple& state) {
+void restore(Table& table, const py::tuple& state) {
     if (state.size() != kParts) refuse();
-    const py::array samples = toNumbers(state[0], "samples");
-    Shape sides = shapeOf(samples);
-    if ((sides.size() != 2 && sides.size() != 4) || sides.back() != 3) refuse();
-    sides.pop_back();
-    Table table = emptyTable(sides);
-    samplesOf(table, py::none())[py::ellipsis()] = samples;
-    const std::vector<ol::RGB> domain = toColours(state[1]);
+    const std::vector<ol::RGB> domain = toColours(state[0]);
     if (domain.size() != 2) refuse();
+    ol::Shaper inputShaper = toShaper(state[1]);
+    ol::Shaper outputShaper = toShaper(state[2]);
+    auto remarks = state[3].cast<std::vector<std::pair<std::uint64_t, std::string>>>();
+
     for (unsigned c = 0; c < 3; ++c) {
         table.lut->transform[c][c] = domain[0][c];
         table.lut->transform[3][c] = domain[1][c];
     }
-    table.lut->inputShaper = toShaper(state[2]);
-    table.lut->outputShaper = toShaper(state[3]);
-    for (auto& [line, text] : state[4].cast<std::vector<std::pair<std::uint64_t, std::string>>>())
+    table.lut->inputShaper = std::move(inputShaper);
+    table.lut->outputShaper = std::move(outputShaper);
+    table.remarks.clear();
+    for (auto& [line, text] : remarks)
         table.remarks.push_back({line, std::move(text)});
-    return table;
 }
 
 }  // namespace python

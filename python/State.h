@@ -6,11 +6,11 @@
 
 namespace python {
 
-/// All that makes a table, as objects that can be copied, pickled and sent to another process.
-pybind11::tuple stateOf(const Table& table);
+/// A function of the package, and its arguments that make the same table again: class, samples, and
+/// what the table has beside them.
+pybind11::tuple partsOf(const pybind11::object& table);
 
-/// The table that a state was taken of.
-/// @throws pybind11::value_error  it is none
-Table tableOfState(const pybind11::tuple& state);
+/// @throws pybind11::value_error  no such state
+void restore(Table& table, const pybind11::tuple& state);
 
 }  // namespace python

@@ -52,37 +52,28 @@ void expectColours(const py::array& colours) {
 
 }  // namespace
 
-Table emptyTable(const Shape& sides) {
-    const auto points = [](py::ssize_t side) {
-        if (side > std::numeric_limits<int>::max()) {
-            throw py::value_error("a table has fewer points than that on a side");
-        }
-        return static_cast<int>(side);
+Table makeTable(const Shape& sides, const py::object& domain) {
+    const ol::Range range = toRange(domain);
+    constexpr py::ssize_t kMost = std::numeric_limits<int>::max();
+    for (const py::ssize_t side : sides) {
+        if (side < 2) throw py::value_error("a table needs two points or more on each side");
+        if (side > kMost) throw py::value_error("a table has fewer points than that on a side");
+    }
+    const auto points = [&](std::size_t axis) {
+        return static_cast<int>(sides.size() == 1 ? sides[0] : sides[axis]);
     };
     Table table;
     try {
         if (sides.size() == 1) {
             table.lut = boost::make_shared<ol::LUT1D>();
-            table.lut->resize(points(sides[0]));
+            table.lut->resize(points(0));
         } else {
             table.lut = boost::make_shared<ol::LUT3D>();
-            table.lut->resize(points(sides[0]), points(sides[1]), points(sides[2]));
+            table.lut->resize(points(0), points(1), points(2));
         }
     } catch (const std::length_error&) {
         throw py::value_error("a table has fewer points than that");
     }
-    return table;
-}
-
-Table makeTable(const Shape& sides, const py::object& domain) {
-    const ol::Range range = toRange(domain);
-    if (*std::min_element(sides.begin(), sides.end()) < 2) {
-        throw py::value_error("a table needs two points or more on each side");
-    }
-    Table table = emptyTable(sides);
-    const auto points = [&](std::size_t axis) {
-        return static_cast<int>(sides.size() == 1 ? sides[0] : sides[axis]);
-    };
     ol::setDomain(*table.lut, range, {points(0), points(1), points(2)});
     return table;
 }

@@ -12,13 +12,8 @@ namespace python {
 
 using Orlith::LUT::Table;
 
-/// A new table, all black, and without a domain.
-/// @param sides  points along each axis: one number for a curve, three for a lattice
-/// @throws pybind11::value_error  more points than a table has
-Table emptyTable(const Shape& sides);
-
 /// A new table, all black.
-/// @param sides   as of emptyTable
+/// @param sides   points along each axis: one number for a curve, three for a lattice
 /// @param domain  None for 0 to 1; otherwise what broadcasts to (2, 3) when there are two numbers,
 ///                or two triples: least and largest inputs
 /// @throws pybind11::value_error  fewer than two points a side, a domain that does not rise
@@ -60,3 +55,23 @@ pybind11::object evaluate(const Table& table, const pybind11::object& colours,
                           const std::string& mode, bool extrapolates);
 
 }  // namespace python
+
+namespace pybind11::detail {
+
+/// Python can make an object without its __init__, and hand it on. It holds no table yet.
+template <>
+class type_caster<Orlith::LUT::Table> : public type_caster_base<Orlith::LUT::Table> {
+public:
+    bool load(handle source, bool convert) {
+        const auto* const type = get_type_info(typeid(Orlith::LUT::Table));
+        if (isinstance(source, reinterpret_cast<PyObject*>(type->type)) &&
+            !reinterpret_cast<instance*>(source.ptr())
+                 ->get_value_and_holder(type)
+                 .holder_constructed()) {
+            throw type_error("this Table is empty: its __init__ was not called");
+        }
+        return type_caster_base<Orlith::LUT::Table>::load(source, convert);
+    }
+};
+
+}  // namespace pybind11::detail

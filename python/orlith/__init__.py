@@ -4,7 +4,7 @@
     >>> look = orlith.read("look.cube")
     >>> look.kind, look.size
     ('3D', (33, 33, 33))
-    >>> graded = look(image)                       # any array (..., 3) of float32 or float64
+    >>> graded = look(image)                       # any array (..., 3) of floats
     >>> look.write("look.3dl", format_3dl="lustre", bit_depth=12)
 
 Files are read as other programs mean them, and written with the same look, which is proven by
@@ -36,3 +36,10 @@ __all__ = [
     "pattern",
     "read",
 ]
+
+
+def _restored(kind, samples, state):
+    """The table that Table.__reduce__ took apart."""
+    table = kind(samples)
+    table._restore(state)
+    return table

@@ -79,7 +79,11 @@ def test_halves_stay_halves():
     np.testing.assert_array_equal(result, table(halves.astype("float32")).astype("float16"))
 
 
-@pytest.mark.parametrize("duplicate", [copy.copy, lambda t: pickle.loads(pickle.dumps(t))])
+@pytest.mark.parametrize(
+    "duplicate",
+    [copy.copy, copy.deepcopy]
+    + [lambda t, n=n: pickle.loads(pickle.dumps(t, n)) for n in range(pickle.HIGHEST_PROTOCOL + 1)],
+)
 def test_can_be_copied_and_sent(duplicate, tmp_path):
     path = tmp_path / "shaped.csp"
     path.write_text("""CSPLUTV100
@@ -202,7 +206,9 @@ TABLE = orlith.Table(places())
 BAD = {
     "codes": (lambda: TABLE(np.zeros((2, 3), "uint8")), TypeError, "not uint8: divide"),
     "long numbers": (lambda: TABLE(np.zeros((2, 3), "longdouble")), TypeError, "not float128"),
-    "state": (lambda: orlith.Table.__new__(orlith.Table).__setstate__((1,)), ValueError, "state"),
+    "state": (lambda: TABLE._restore((places((2,)),)), ValueError, "state"),
+    "raw": (lambda: repr(orlith.Table.__new__(orlith.Table)), TypeError, "__init__"),
+    "raw samples": (lambda: orlith.Table.__new__(orlith.Table).samples, TypeError, "__init__"),
     "complex": (lambda: TABLE(np.zeros((2, 3), complex)), TypeError, "not complex128"),
     "objects": (lambda: TABLE(np.full(3, None)), TypeError, "not object"),
     "words": (lambda: TABLE("red"), ValueError, "red"),
