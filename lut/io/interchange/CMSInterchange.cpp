@@ -31,7 +31,7 @@ bool CMSInterchange::takeKeyword(std::string_view line) {
     if (keyword == "LUT_3D_INPUT_RANGE") {
         range_ = expectRangeBehind(line);
     } else {
-        remark("unknown", quoted(keyword) + " is not known and not used");
+        remarkUnknown(line);
     }
     return false;
 }

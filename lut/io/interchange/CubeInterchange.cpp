@@ -65,7 +65,7 @@ bool CubeInterchange::takeKeyword(std::string_view line) {
     } else {
         const char* const why =
             isKeywordInSmallLetters(keyword) ? ": keywords are in capital letters" : "";
-        remark("unknown", quoted(keyword) + " is not known and not used" + why);
+        remarkUnknown(line, why);
     }
     return false;
 }

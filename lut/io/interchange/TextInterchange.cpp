@@ -126,6 +126,30 @@ void TextInterchange::expectNumbers(std::string_view line) {
     }
 }
 
+void TextInterchange::expectOwnFormat(std::string_view line) {
+    static constexpr struct {
+        std::string_view line;
+        const char* format;
+    } kMarks[] = {{"LUT_1D_SIZE", ".cube"},
+                  {"LUT_3D_SIZE", ".cube"},
+                  {"NUCODA_3D_CUBE", ".cms"},
+                  {"# Truelight Cube", ".cub"}};
+    for (const auto& mark : kMarks) {
+        if (line.substr(0, mark.line.size()) != mark.line) continue;
+        fail(dataError(), quoted(mark.line) + " tells a " + mark.format + " file by another name");
+    }
+}
+
+void TextInterchange::remarkUnknown(std::string_view line, const std::string& more) {
+    expectOwnFormat(line);
+    const Tokens words(line);
+    // Among samples it is one that is misspelt.
+    if (sampleCount() > 0 && words.count() == 3 && isNumber(words[1]) && isNumber(words[2])) {
+        expectNumbers(line);
+    }
+    remark("unknown", quoted(words[0]) + " is not known and not used" + more);
+}
+
 RGB TextInterchange::expectNumbersBehind(std::string_view line, std::size_t count) {
     std::string_view keyword;
     takeWord(line, keyword);

@@ -99,6 +99,14 @@ protected:
     /// Fails with a text of the book and its reason.
     [[noreturn]] void fail(const char* message, const std::string& reason);
 
+    /// Fails on a line that tells a file of another format, whose numbers would make another look.
+    /// @throws Exception  the data error
+    void expectOwnFormat(std::string_view line);
+
+    /// Remarks a keyword that is not known, by its line, and what more there is to say.
+    /// @throws Exception  the data error: of a misspelt sample, and as expectOwnFormat
+    void remarkUnknown(std::string_view line, const std::string& more = "");
+
     /// The finite numbers behind a keyword.
     /// @param count       how many there have to be; those that are missing in three are 0
     /// @throws Exception  the data error

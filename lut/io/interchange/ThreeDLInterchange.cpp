@@ -129,12 +129,18 @@ bool ThreeDLInterchange::isVerbatim(std::string_view line) {
     return !isBelowHeader_ && isLineOf3DMesh(line);
 }
 
+bool ThreeDLInterchange::takeComment(std::string_view line) {
+    if (isBelowHeader_) return false;
+    expectOwnFormat(line);
+    return true;
+}
+
 bool ThreeDLInterchange::passesOver(std::string_view line) {
     if (!isMeant()) return false;
     // What else begins a number was seen to be one.
     const bool isWord = isLineOf3DMesh(line) ||
                         std::string_view("+-.0123456789").find(line[0]) == std::string_view::npos;
-    if (isWord) remark("unknown", quoted(Tokens(line)[0]) + " is not known here and not used");
+    if (isWord) remarkUnknown(line);
     return isWord;
 }
 

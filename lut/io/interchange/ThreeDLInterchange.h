@@ -61,7 +61,7 @@ public:
 protected:
     const char* dataError() const override;
     bool isVerbatim(std::string_view line) override;
-    bool takeComment(std::string_view) override { return !isBelowHeader_; }
+    bool takeComment(std::string_view line) override;
     bool takeKeyword(std::string_view) override { return !isBelowHeader_; }
     std::string reasonOf(std::string_view message, std::string_view lastLine) override;
 

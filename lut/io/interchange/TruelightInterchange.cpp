@@ -55,7 +55,7 @@ bool TruelightInterchange::takeComment(std::string_view line) {
 }
 
 bool TruelightInterchange::takeKeyword(std::string_view line) {
-    remark("unknown", quoted(line) + " is not known and not used");
+    remarkUnknown(line);
     return false;
 }
 

@@ -61,7 +61,7 @@ bool VFInterchange::takeKeyword(std::string_view line) {
     }
     if (keywordCount_ == 2) return true;
     if (!hasData_) return takeParameter(line);
-    remark("unknown", quoted(line) + " is not known and not used");
+    remarkUnknown(line);
     return false;
 }
 
@@ -84,7 +84,7 @@ bool VFInterchange::takeParameter(std::string_view line) {
         expectNumbersBehind(line, 16);
         hasPlacement_ = true;
     } else {
-        remark("unknown", quoted(keyword) + " is not known and not used");
+        remarkUnknown(line);
         return false;
     }
     return true;
