@@ -12,16 +12,16 @@ namespace Orlith::LUT {
 /// Every colour goes through the pre-LUT, then to a position between the table's points, then
 /// through the method:
 /// - A lattice: within the domain the result is bit for bit that of LUT::interpolate.
-/// - A curve, whatever the method: that of LUT::interpolate for the colour behind the pre-LUT,
-/// which
-///   is looked up from 0 to 1. A channel whose transform is not exactly that of setUnitDomain
+/// - A curve, whatever the method: that of LUT::interpolate for the colour behind the pre-LUT, from
+///   0 to 1. A channel whose transform is not exactly that of setUnitDomain
 ///   (scale 1 / (N - 1) in single precision, offset 0) has a domain of its own, and is looked up at
 ///   (p - offset) / (scale * (N - 1)) instead.
 /// - A table without samples gives zeros.
 ///
 /// Threads  apply may run any number of times at once.
-/// Memory   with the first many colours a copy of the table is made, a third larger than itself and
-///          shared by the Evaluator's copies; not of lattices of more than 158 points a side.
+/// Memory   with the first many colours a copy of the table is made, which the Evaluator's copies
+///          share: a third larger than the table (cubic: nearly three times as large), or more
+///          where sides are short; not of lattices of more than 158 points a side.
 class Evaluator {
 public:
     enum class Method {

@@ -131,6 +131,9 @@ void OutputFile::makeStage(const fs::path& folder, const std::string& fileName) 
     }
     const int error = errno;
     forgetUnfinishedFile();
+    if (error == ENOENT) {
+        throw Failure(fmt::format("{}: there is no folder {}", name_, folder.string()));
+    }
     fail(error);
 }
 
@@ -184,6 +187,12 @@ void OutputFile::replaceTarget() {
     if (error != 0) fail(error);
     if (!scope_.close()) throw Cancelled();
     if (std::rename(stagedPath_.c_str(), target_.c_str()) != 0) fail(errno);
+}
+
+void expectOtherFile(const std::string& output, const std::string& input) {
+    std::error_code ignored;
+    if (!fs::equivalent(output, input, ignored)) return;
+    throw Failure(fmt::format("{}: is read here, and would be replaced", output));
 }
 
 bool isStream(const std::string& path) {

@@ -72,6 +72,9 @@ private:
     std::string stagedPath_;
 };
 
+/// @throws Failure  what would be written is what is read, and of another kind
+void expectOtherFile(const std::string& output, const std::string& input);
+
 /// Whether what is written under that path goes to a pipe or a device.
 bool isStream(const std::string& path);
 

@@ -93,6 +93,10 @@ std::string usageProblem(const CLI::App& program, const CLI::ParseError& error) 
     const CLI::App& command = *chosen.front();
     std::string problem = error.what();
     const auto surplus = program.remaining(true);
+    if (command.get_name() == "bake" &&
+        std::find(surplus.begin(), surplus.end(), "{in}") != surplus.end()) {
+        problem = "PROGRAM and its words stand behind --";
+    }
     if (!surplus.empty() && surplus.front().rfind("--", 0) == 0) {
         const std::string word = surplus.front().substr(0, surplus.front().find('='));
         problem = withNearest("unknown option", word, optionNames(command));

@@ -38,8 +38,9 @@ public:
             const float inverse = 1.0F / scale;
             int exponent;
             const bool isPowerOfTwo = std::fabs(std::frexp(scale, &exponent)) == 0.5F;
-            onlyMultiplies_ = onlyMultiplies_ && placement.offset[c] == 0.0F && isPowerOfTwo &&
-                              std::isfinite(inverse);
+            // -0 - -0 is no -0.
+            const bool isZero = placement.offset[c] == 0.0F && !std::signbit(placement.offset[c]);
+            onlyMultiplies_ = onlyMultiplies_ && isZero && isPowerOfTwo && std::isfinite(inverse);
             offset_[c] = hn::Set(d, placement.offset[c]);
             scale_[c] = hn::Set(d, scale);
             inverse_[c] = hn::Set(d, inverse);
@@ -53,7 +54,7 @@ public:
         // Multiplying by the inverse of a power of two is dividing by it, but faster.
         const V x = onlyMultiplies_ ? hn::Mul(point, inverse_[c])
                                     : hn::Div(hn::Sub(point, offset_[c]), scale_[c]);
-        return hn::Min(NotBelowZero(x), last_[c]);
+        return hn::Min(last_[c], NotBelowZero(x));  // in this order -0 stays where last is 0
     }
 
     /// Where in the lattice whole-numbered positions stand, in floats. Added to 2^23, whose last

@@ -14,6 +14,7 @@ Placement::Placement(const LUT& lut) {
         const auto lastIndex = static_cast<float>(sizes[c] - 1);
         const bool isRounding = end[c] > lastIndex && end[c] < lastIndex + 1.0F;
         last[c] = isRounding ? end[c] : lastIndex;
+        holdsDomain = holdsDomain && end[c] < lastIndex + 1.0F;
     }
 }
 

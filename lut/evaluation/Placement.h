@@ -29,6 +29,10 @@ struct Placement {
     /// upwards, it is that quotient: such a colour is within the domain and evaluated where it
     /// falls.
     LatticePosition last;
+
+    /// Whether every colour within the domain is evaluated where it falls: not where the domain's
+    /// last point rounds a cell or more beyond the lattice.
+    bool holdsDomain = true;
 };
 
 /// Finds colours behind the pre-LUT in a curve: 0 is its first point, 1 the last.

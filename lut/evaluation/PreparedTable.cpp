@@ -163,6 +163,7 @@ std::unique_ptr<const PreparedTable> prepareLattice(const LUT& table, PreLUT pre
     const Lattice lattice(table);
     if (PaddedLattice::sampleCount(lattice) > PaddedLattice::kMostSamples) return nullptr;
     if (method == Method::Cubic && !suitsCubicVectors(table)) return nullptr;
+    if (outside == Outside::Extrapolate && !Placement(table).holdsDomain) return nullptr;
     return std::make_unique<PreparedLattice>(table, std::move(preLUT), lattice, method, outside);
 }
 

@@ -3,6 +3,7 @@
 
 #include <algorithm>
 #include <atomic>
+#include <cmath>
 #include <cstdint>
 #include <filesystem>
 #include <memory>
@@ -65,6 +66,13 @@ void expectUsable(const ApplyOptions& options) {
     }
 }
 
+std::uint64_t countNaN(const float* rgb, std::size_t colourCount) {
+    std::uint64_t count = 0;
+    for (const float* each = rgb; each != rgb + 3 * colourCount; each += 3)
+        count += std::isnan(each[0]) || std::isnan(each[1]) || std::isnan(each[2]) ? 1 : 0;
+    return count;
+}
+
 /// A table, and the colours that have come to it from outside its domain since it was last asked.
 struct AppliedTable {
     std::string name;
@@ -72,6 +80,7 @@ struct AppliedTable {
     Orlith::LUT::Range inputs;
     bool canGoOn;  // beyond its domain: a curve and a pre-LUT end there
     std::atomic<std::uint64_t> outsideCount{0};  // added to by all threads
+    std::atomic<std::uint64_t> nanCount{0};      // of them, those with a channel that is no number
 
     void apply(float* rgb, std::size_t colourCount) {
         std::uint64_t outside = 0;
@@ -83,6 +92,7 @@ struct AppliedTable {
             outside += kept == 3 ? 0 : 1;
         }
         outsideCount += outside;
+        if (outside > 0) nanCount += countNaN(rgb, colourCount);
         way(rgb, colourCount);
     }
 };
@@ -181,6 +191,7 @@ private:
     void warnOfColoursOutside(const std::string& image, const host::CopiedImage& copied) {
         for (const auto& each : tables_) {
             const std::uint64_t count = each->outsideCount.exchange(0);
+            const std::uint64_t nanCount = each->nanCount.exchange(0);
             const bool isHeld = !(options_.colours.extrapolates && each->canGoOn);
             if (count == 0 || options_.reading.isStrict || !isHeld ||
                 !clampedTables_.insert(each.get()).second)
@@ -189,11 +200,14 @@ private:
             const double all = static_cast<double>(copied.width) * copied.height;
             warn(fmt::format(
                 "{}: {:.3g} % of its colours are outside the domain of {}, {} to {}, and"
-                " held at its edge{}",
+                " held at its edge{}{}",
                 image, 100.0 * static_cast<double>(count) / all, each->name,
                 colourText(each->inputs.min.data_block()),
                 colourText(each->inputs.max.data_block()),
-                each->canGoOn ? " (--extrapolate goes on in straight lines)" : ""));
+                each->canGoOn ? " (--extrapolate goes on in straight lines)" : "",
+                nanCount == 0 ? ""
+                              : fmt::format("; {} are no numbers, which count as its first point",
+                                            nanCount)));
         }
     }
 
@@ -248,8 +262,10 @@ void addApply(CLI::App& program, int& status) {
                 if (options->frames) return;
                 throw CLI::ValidationError(
                     "--frames",
-                    fmt::format("\"{}\" has to be frames from A to B, such as 1-100 or 1-100x2",
-                                word));
+                    fmt::format(
+                        "\"{}\" has to be one run of frames from A up to B, such as 1-100 or "
+                        "1-100x2 for every second one",
+                        word));
             },
             "Images of a sequence: their names have #### or %04d in place of the number")
         ->type_name("A-B");

@@ -1,15 +1,18 @@
 #include <fmt/format.h>
 #include <CLI/CLI.hpp>
 
+#include <algorithm>
 #include <array>
 #include <cstdio>
 #include <iostream>
 #include <string>
+#include <string_view>
 #include <vector>
 
 #include "lut/io/text/Numbers.h"
 #include "lut/io/text/Tokens.h"
 #include "orlith/Command.h"
+#include "orlith/Messages.h"
 #include "orlith/Options.h"
 #include "orlith/table/ColourOptions.h"
 #include "orlith/table/TableFile.h"
@@ -18,6 +21,8 @@ namespace orlith {
 namespace {
 
 namespace ol = Orlith::LUT;
+
+constexpr std::string_view kByteOrderMark = "\xef\xbb\xbf";
 
 struct EvalOptions {
     std::string path;
@@ -42,11 +47,27 @@ void evaluate(const ColourWay& way, std::vector<float>& colours) {
     colours.clear();
 }
 
+/// "0,5 0,25 1,0": three words, each with a comma between digits. Others stand between numbers.
+bool hasDecimalCommas(std::string_view line) {
+    const ol::Tokens words(line);
+    if (words.count() != 3) return false;
+    for (unsigned c = 0; c < 3; ++c) {
+        const std::size_t comma = words[c].find(',');
+        if (comma == 0 || comma == std::string_view::npos || comma + 1 == words[c].size() ||
+            words[c].find(',', comma + 1) != std::string_view::npos)
+            return false;
+    }
+    return true;
+}
+
 /// Takes the line's colour, if it has one.
 /// @return false  it has something else
-bool addColour(std::string_view line, std::vector<float>& colours) {
+bool addColour(std::string line, std::vector<float>& colours) {
+    const char instead = hasDecimalCommas(line) ? '.' : ' ';
+    std::replace(line.begin(), line.end(), ',', instead);
+    std::replace(line.begin(), line.end(), ';', ' ');
     const ol::Tokens words(line);
-    if (words.empty()) return true;
+    if (words.empty() || words[0][0] == '#') return true;
     if (words.count() != 3) return false;
     std::array<float, 3> colour{};
     for (unsigned c = 0; c < 3; ++c)
@@ -62,11 +83,14 @@ void evaluateInput(const ColourWay& way) {
     std::vector<float> colours;
     std::string line;
     for (int number = 1; std::getline(std::cin, line); ++number) {
-        const bool isColour = addColour(ol::trim(line), colours);
+        if (number == 1 && line.rfind(kByteOrderMark, 0) == 0) line.erase(0, kByteOrderMark.size());
+        const bool isColour = addColour(std::string(ol::trim(line)), colours);
         const bool isWaitedFor = std::cin.rdbuf()->in_avail() <= 0;
         if (!isColour || isWaitedFor || colours.size() >= kMostFloats) evaluate(way, colours);
         if (!isColour) {
-            throw Failure(fmt::format("standard input:{}: expected three numbers", number));
+            constexpr std::size_t kMostShown = 60;
+            throw Failure(fmt::format("standard input:{}: \"{}\" is not three numbers", number,
+                                      printable(ol::trim(line).substr(0, kMostShown))));
         }
         if (isWaitedFor) std::fflush(stdout);
     }
@@ -75,11 +99,10 @@ void evaluateInput(const ColourWay& way) {
 }
 
 int runEval(const EvalOptions& options) {
-    std::vector<float> colour(options.colour.size());
-    for (std::size_t c = 0; c < colour.size(); ++c) {
-        if (!parseColour(options.colour[c], colour[c])) {
-            throw UsageError(fmt::format("\"{}\" is not a number", options.colour[c]));
-        }
+    const std::string words = fmt::format("{}", fmt::join(options.colour, " "));
+    std::vector<float> colour;
+    if (!addColour(words, colour) || colour.empty() != options.colour.empty()) {
+        throw UsageError(fmt::format("\"{}\" is not three numbers", words));
     }
     if (options.path == "-" && options.colour.empty()) {
         throw UsageError("table and colours cannot both come from standard input");
@@ -101,7 +124,7 @@ void addEval(CLI::App& program, int& status) {
         program, "eval", "Send a colour, or each line of standard input, through a table");
     const auto options = std::make_shared<EvalOptions>();
     command->add_option("LUT", options->path, "Table to read")->required();
-    command->add_option("COLOUR", options->colour, "Red, green and blue")->expected(3);
+    command->add_option("COLOUR", options->colour, "Red, green and blue")->expected(1, 3);
     addFromOption(*command, options->reading);
     addReadOptions(*command, options->reading);
     addColourOptions(*command, options->colours);

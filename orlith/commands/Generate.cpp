@@ -135,6 +135,7 @@ int runGenerate(const GenerateOptions& options) {
     if (path == "-" && formatWritten(generate, path).empty()) {
         throw UsageError("standard output has no extension: name the format by --file-type");
     }
+    expectOtherFile(path, options.image);
     const std::string unreadable = whyUnreadable(formatWritten(generate, path), *pattern.table);
     if (!unreadable.empty()) throw Failure(fmt::format("{}: {}", path, unreadable));
     FlatPattern centres(read, image.box(), *pattern.table);

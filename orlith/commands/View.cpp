@@ -44,15 +44,6 @@ std::string pageName(const ViewOptions& options) {
     return options.a == "-" ? "table.html" : fs::path(options.a).stem().string() + ".html";
 }
 
-void expectOtherFile(const std::string& page, const ViewOptions& options) {
-    for (const std::string& shown : {options.a, options.b, options.image}) {
-        std::error_code ignored;
-        if (fs::equivalent(page, shown, ignored)) {
-            throw Failure(fmt::format("{}: is shown, so it cannot be the page", page));
-        }
-    }
-}
-
 report::PageTable pageTable(const std::string& path, const ViewOptions& options) {
     const Table table = readWholeTable(path, readingAmong(path, options.reading));
     const ol::LUT& lut = *table.lut;
@@ -129,7 +120,8 @@ int runView(const ViewOptions& options) {
     if (options.a == "-" && options.b == "-") {
         throw UsageError("only one of the tables can come from standard input");
     }
-    expectOtherFile(pageName(options), options);
+    for (const std::string& shown : {options.a, options.b, options.image})
+        expectOtherFile(pageName(options), shown);
     std::vector<report::PageTable> tables = {pageTable(options.a, options)};
     if (!options.b.empty()) tables.push_back(pageTable(options.b, options));
 

@@ -1,8 +1,9 @@
 #include "orlith/table/ColourOptions.h"
 
 #include <CLI/CLI.hpp>
-#include <map>
 #include <string>
+#include <utility>
+#include <vector>
 
 #include "orlith/Command.h"
 
@@ -11,6 +12,12 @@ namespace {
 
 namespace ol = Orlith::LUT;
 using Method = ol::Evaluator::Method;
+
+constexpr std::pair<const char*, Method> kMethods[] = {{"step", Method::Step},
+                                                       {"staggered", Method::Staggered},
+                                                       {"trilinear", Method::Trilinear},
+                                                       {"tetrahedral", Method::Tetrahedral},
+                                                       {"cubic", Method::Cubic}};
 
 }  // namespace
 
@@ -53,14 +60,19 @@ ColourWay wayThrough(const boost::shared_ptr<const ol::LUT>& table, const Colour
 }
 
 void addColourOptions(CLI::App& command, ColourOptions& options) {
-    const std::map<std::string, Method> methods = {{"step", Method::Step},
-                                                   {"staggered", Method::Staggered},
-                                                   {"trilinear", Method::Trilinear},
-                                                   {"tetrahedral", Method::Tetrahedral},
-                                                   {"cubic", Method::Cubic}};
-    command.add_option("--mode", options.method, "Interpolation of a lattice (trilinear)")
-        ->transform(CLI::CheckedTransformer(methods, CLI::ignore_case)
-                        .description("{step,staggered,trilinear,tetrahedral,cubic}"))
+    std::vector<std::string> names;
+    for (const auto& [name, method] : kMethods)
+        names.emplace_back(name);
+    command
+        .add_option_function<std::string>(
+            "--mode",
+            [&options](const std::string& word) {
+                for (const auto& [name, method] : kMethods) {
+                    if (word == name) options.method = method;
+                }
+            },
+            "Interpolation of a lattice (trilinear)")
+        ->transform(CLI::IsMember(names, CLI::ignore_case))
         ->type_name("METHOD");
     command.add_flag("--extrapolate", options.extrapolates,
                      "Continue a lattice beyond its domain in straight lines; else clamp to it");

@@ -112,10 +112,14 @@ struct Domain {
     bool isShaped;
 };
 
+/// Its last input, 1000.00006, is found beyond the point behind the last one.
+constexpr Domain kBeyond = {"", {3, 3, 3}, {1.6e-5F, 1.6e-5F, 1.6e-5F}, {1000, 1000, 1000}, false};
+
 constexpr Domain kDomains[] = {
     {"unit", {17, 9, 5}, {1 / 16.0F, 1 / 8.0F, 1 / 4.0F}, {0, 0, 0}, false},
     {"one that rounds", {50, 4, 62}, {1 / 49.0F, 1 / 3.0F, 1 / 61.0F}, {0, 0, 0}, false},
     {"unequal sides", {3, 4, 5}, {0.5F, 0.3F, 1e-5F}, {-1, 3, 0.125F}, false},
+    {"from minus zero", {3, 5, 9}, {0.5F, 0.25F, 0.125F}, {-0.0F, -0.0F, -0.0F}, false},
     {"indices", {2, 9, 6}, {1, 1, 1}, {0, 0, 0}, false},
     {"behind shapers", {6, 5, 7}, {1 / 5.0F, 1 / 4.0F, 1 / 6.0F}, {0, 0, 0}, true},
 };
@@ -236,6 +240,14 @@ TEST_P(Evaluator, ExtrapolatesAsInterpolateDoes) {
                 expected.push_back(byTheBook(*lut, colour, method, true));
             expectSame(evaluate(lut, colours, method, Outside::Extrapolate), expected, colours);
         }
+    }
+    const auto beyond = makeLattice(kBeyond);
+    ol::RGB min;
+    ol::RGB max;
+    beyond->minmax(min, max);
+    for (const Method method : kMethods) {
+        expectSame(evaluate(beyond, Colours{max}, method, Outside::Extrapolate),
+                   {byTheBook(*beyond, max, method, true)}, {max});
     }
     // 0.5 + r / 4 - g / 8 + b / 16, which every tetrahedron continues exactly.
     const auto plane = makeLattice(kDomains[0]);

@@ -345,7 +345,7 @@ TEST_F(ApplyTest, RefusesWhatCannotBeDone) {
         {"grey.tif o.tif --lut look.cube", "grey.tif: needs red, green and blue channels, has 1"},
         {"two.tif o.tif --lut look.cube", "two.tif: needs red, green and blue channels, has 2"},
         {"none.exr o.exr --lut look.cube", "none.exr: No such file or directory"},
-        {"good.exr none/o.exr --lut look.cube", "none/o.exr: No such file or directory"},
+        {"good.exr none/o.exr --lut look.cube", "none/o.exr: there is no folder none"},
         {"good.exr o.exr --lut none.cube", "none.cube: No such file or directory"},
         {"good.exr o.exr --lut bad.cube", "bad.cube:2: Iridas LUT reader: syntax error"},
         {"good.exr o.png --lut look.cube --type half",

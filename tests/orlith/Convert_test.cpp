@@ -162,7 +162,7 @@ TEST_F(ConvertTest, SaysWhyNot) {
         {"convert curve.cube c.blut --strict", 1, "",
          "orlith: error: c.blut: a .blut file is written of lattices only\n"},
         {"convert curve.cube none/c.csp", 1, "",
-         "orlith: error: none/c.csp: No such file or directory\n"},
+         "orlith: error: none/c.csp: there is no folder none\n"},
         {"convert none.cube c.csp", 1, "", "orlith: error: none.cube: No such file or directory\n"},
         {"convert folder.cube c.csp", 1, "", "orlith: error: folder.cube: is a folder\n"},
         {"convert bad.cube c.csp", 1, "",
@@ -174,11 +174,12 @@ TEST_F(ConvertTest, SaysWhyNot) {
         {"convert huge.cube c.csp", 1, "",
          "orlith: error: huge.cube:1: declares a size that no table can have\n"},
         {"convert table c.csp", 1, "",
-         "orlith: error: table: No reader found for extension \"\". (name the format by --from)\n"},
+         "orlith: error: table: No reader found for extension \"\". (name the format by --from: "
+         "3dl, blut, cms, csp, cub, cube or vf)\n"},
         {"convert table d --from cube --to .csp --quiet", 0, "", ""},
         {"convert curve.cube c.xyz", 1, "",
-         "orlith: error: c.xyz: No writer found for extension \".xyz\". (name the format by "
-         "--to)\n"},
+         "orlith: error: c.xyz: No writer found for extension \".xyz\". (name the format by --to: "
+         "3dl, blut, cms, csp, cub, cube or vf)\n"},
         {"convert few.cube f.blut", 1, "",
          "orlith: error: few.cube:2: Iridas LUT reader: syntax error while reading LUT data. (the"
          " file ends after 1 of 2097152 samples)\n"},

@@ -121,17 +121,23 @@ TEST_F(InspectTest, EvalSendsColoursThroughATable) {
         {"eval a.cube 1e-60 +1 1e60 --strict", 0, "nan nan nan\n", ""},
         {"eval a.cube nan inf -inf", 0, "1 0 0.5\n", ""},
         {"eval a.cube -.5 1 -nan", 0, "1 0 0.5\n", ""},
-        {"eval a.cube 1 1 0x1", 2, "", "orlith: error: \"0x1\" is not a number\n"},
+        {"eval a.cube 1 1 0x1", 2, "", "orlith: error: \"1 1 0x1\" is not three numbers\n"},
+        {"eval a.cube 0,25 1,0 0,0", 0, "1 0.25 0.5\n", ""},
+        {"eval a.cube 0.25 1 0", 0, "1 0.25 0.5\n", ""},
+        {"eval a.cube 0.25,1,0", 0, "1 0.25 0.5\n", ""},
     });
     EXPECT_EQ(output("eval - 0.25 0.5 0.5 --from .CUBE", kLattice), "0.5 0.25 0.375\n");
     EXPECT_EQ(output("eval a.cube", ""), "");
     EXPECT_EQ(output("eval a.cube", "0 0 0\r\n\n \t1\t0.25 +1e0 \n-1 5 nan"),
               "0 0 0.5\n0.25 1 0.25\n1 0 0.5\n");
-    for (const std::string line : {"1 2", "1 2 3 4", "1 2 3x"}) {
+    EXPECT_EQ(output("eval a.cube", "\xef\xbb\xbf# R G B\n0, 0, 0\n.25;1;0\n0,25 1,0 0,0\n"),
+              "0 0 0.5\n1 0.25 0.5\n1 0.25 0.5\n");
+    for (const std::string line : {"1 2", "1 2 3 4", "1 2 3x", "0,5, 0,5, 0,5"}) {
         const test::Outcome outcome = run("eval a.cube", "0 0 0\n\n" + line + "\n1 1 1\n");
         EXPECT_EQ(outcome.status, 1) << line;
         EXPECT_EQ(outcome.out, "0 0 0.5\n");
-        EXPECT_EQ(outcome.err, "orlith: error: standard input:3: expected three numbers\n");
+        EXPECT_EQ(outcome.err,
+                  "orlith: error: standard input:3: \"" + line + "\" is not three numbers\n");
     }
 }
 

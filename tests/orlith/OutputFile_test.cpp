@@ -67,14 +67,15 @@ TEST_F(OutputFileTest, WhatCannotBeWrittenWholeLeavesTheOldFile) {
         {"ulimit -f 2; $ORLITH pattern old.tif --size 17", "old.tif", ""},
         // The format's writer does not look.
         {"ulimit -f 2; $ORLITH pattern old.sgi --size 17", "old.sgi", "cannot be written whole"},
-        {"$ORLITH view a.cube --output a.cube", "a.cube", "is shown"},
+        {"$ORLITH view a.cube --output a.cube", "a.cube", "is read here"},
+        {"$ORLITH generate p.exr p.exr --file-type .cube", "p.exr", "is read here"},
         {"ulimit -f 40; $ORLITH generate p.exr old.cms --lut1d 9000", "old.cms",
          "Error writing LUT file: not all of the file could be written (File too large)\n"},
         {"$ORLITH convert a.cube full.cube", "full.cube", "No space left on device"},
         {"$ORLITH generate p.exr full.cube", "full.cube", "No space left on device"},
         {"$ORLITH convert a.cube folder.cube", "folder.cube", "Is a directory"},
         {"$ORLITH convert a.cube loop.cube", "loop.cube", "Too many levels of symbolic links"},
-        {"$ORLITH convert a.cube none/o.cube", "none/o.cube", "No such file or directory"},
+        {"$ORLITH convert a.cube none/o.cube", "none/o.cube", "there is no folder none"},
     };
     for (const auto& each : kCases) {
         const std::string file = each.file;

@@ -153,11 +153,12 @@ TEST_F(UsageTest, WrongUsageIsOneLineAndStatusTwo) {
         {"apply a.exr b.exr", "--lut is required"},
         {"apply a.exr - --lut a.cube", "an image goes to a file"},
         {"apply a.exr b.exr --lut - --lut -", "only one of the tables"},
-        {"apply a.#.exr b.#.exr --lut a.cube --frames 5-1", "\"5-1\" has to be frames from A to B"},
+        {"apply a.#.exr b.#.exr --lut a.cube --frames 5-1",
+         "\"5-1\" has to be one run of frames from A up to B"},
         {"apply a.#.exr b.#.exr --lut a.cube --frames 1-5x0", "such as 1-100 or 1-100x2"},
         {"apply a.#.exr b.exr --lut a.cube --frames 1-5", "\"b.exr\" has to have a place"},
         {"apply a.%4.exr b.#.exr --lut a.cube --frames 1-5", "\"a.%4.exr\" has to have a place"},
-        {"eval a.cube 0 0 x", "\"x\" is not a number"},
+        {"eval a.cube 0 0 x", "\"0 0 x\" is not three numbers"},
         {"diff a.cube b.cube --tolerance nan", "\"nan\" has to be a number"},
     };
     for (const auto& each : kCases) {

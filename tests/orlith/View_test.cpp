@@ -31,7 +31,7 @@ TEST_F(ViewTest, WhatCannotBeShownIsOneLine) {
         {"view none.cube", "none.cube: No such file or directory"},
         {"view a.cube none.cube", "none.cube: No such file or directory"},
         {"view one.csp --strict", "one.csp: 1 x 1 x 2 points have no curves"},
-        {"view a.cube --output missing/page.html", "missing/page.html: No such file or directory"},
+        {"view a.cube --output missing/page.html", "missing/page.html: there is no folder missing"},
         {"view a.cube --image none.png --output old.html", "none.png: No such file or directory"},
         {"view a.cube --image noise.png --output old.html", "noise.png"},
     };

@@ -23,7 +23,7 @@ std::string formatProblem(const char* message, const std::string& extension,
     if (const std::size_t place = text.find("%s"); place != std::string::npos) {
         text.replace(place, 2, extension);
     }
-    return text + " (name the format by " + option + ")";
+    return text + " (name the format by " + option + ": 3dl, blut, cms, csp, cub, cube or vf)";
 }
 
 }  // namespace Orlith::LUT

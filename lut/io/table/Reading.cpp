@@ -45,6 +45,7 @@ FileError failureOf(const LUTFileReader& reader, const Exception& exception,
 }  // namespace
 
 void expectReadableFile(const std::string& path, const std::string& name) {
+    if (name.empty()) throw FileError("a table", 0, "has no name");
     std::error_code ignored;
     if (std::filesystem::is_directory(path, ignored)) throw FileError(name, 0, "is a folder");
     if (access(path.c_str(), R_OK) != 0) {
