@@ -167,6 +167,8 @@ int runBake(const BakeOptions& options) {
             return "from the tables " + deviationText(largestDeviation(tables, file));
         };
     }
+    // A look may make what the format has no numbers for.
+    if (!options.reading.isStrict) baked.lut = target.fit(baked.lut, 0).lut;
     origin.table = baked.lut;
     target.write(output, baked, origin);
     return kDone;

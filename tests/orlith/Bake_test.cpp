@@ -177,6 +177,11 @@ TEST_F(BakeTest, SaysWhatIsWrongWithAProgramOrItsImage) {
     expect("bake o.vf --size 6 --quiet --image-type png -- oiiotool {in} -d uint8 -o {out}", 0, "",
            coarse);
 
+    const test::Outcome wild =
+        run("bake o.cube --size 3 -- oiiotool {in} --subc 0.5 --powc 0.5 -o {out}");
+    EXPECT_EQ(wild.status, 1);
+    test::expectIn(wild.err, "samples that are not finite, which .cube files cannot hold\n");
+
     folder_.write("run.sh", "touch ran; cp $1 $2\n");
     for (const std::string file : {"none/o.cube", "o.3dl --size 66", "o.xyz"})
         EXPECT_EQ(run("bake " + file + " -- sh run.sh {in} {out}").status, 1) << file;
