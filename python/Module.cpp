@@ -114,14 +114,16 @@ struct Difference {
     ol::Differences channels;
 };
 
-Difference diff(const py::object& a, const py::object& b, const std::string& mode,
-                bool extrapolates) {
+Difference diff(const py::object& a, const py::object& b, const py::object& mode,
+                const py::object& extrapolate) {
     const auto method = toMethod(mode);
+    const auto outside = toOutside(extrapolate);
     const auto lutA = toLUT(a);
     const auto lutB = toLUT(b);
     const auto lookOf = [&](const boost::shared_ptr<const ol::LUT>& lut) -> ol::ColourWay {
-        return [evaluator = ol::Evaluator(lut, method, toOutside(extrapolates))](
-                   float* rgb, std::size_t count) { evaluator.apply(rgb, rgb, count); };
+        return [evaluator = ol::Evaluator(lut, method, outside)](float* rgb, std::size_t count) {
+            evaluator.apply(rgb, rgb, count);
+        };
     };
     const py::gil_scoped_release others;
     return {ol::compareLooks(*lutA, lookOf(lutA), *lutB, lookOf(lutB))};

@@ -44,6 +44,16 @@ py::array toColumns(const std::vector<float>& left, const std::vector<float>& ri
     return columns;
 }
 
+template <class Value>
+Value expect(const char* name, const char* type, const py::object& given) {
+    py::detail::make_caster<Value> caster;
+    if (!caster.load(given, true)) {
+        throw py::type_error(std::string(name) + " has to be " + type + ", not " +
+                             std::string(py::str(given.get_type().attr("__name__"))));
+    }
+    return py::detail::cast_op<Value>(caster);
+}
+
 void expectColours(const py::array& colours) {
     if (colours.ndim() > 0 && colours.shape(colours.ndim() - 1) == 3) return;
     throw py::value_error("the last axis of colours has to be 3 (red, green, blue), not shape " +
@@ -161,13 +171,14 @@ py::list remarksOf(const Table& table) {
     return list;
 }
 
-ol::Evaluator::Method toMethod(const std::string& mode) {
+ol::Evaluator::Method toMethod(const py::object& given) {
     using Method = ol::Evaluator::Method;
     static const std::map<std::string, Method> methods = {{"step", Method::Step},
                                                           {"staggered", Method::Staggered},
                                                           {"trilinear", Method::Trilinear},
                                                           {"tetrahedral", Method::Tetrahedral},
                                                           {"cubic", Method::Cubic}};
+    const auto mode = expect<std::string>("mode", "a str", given);
     const auto found = methods.find(mode);
     if (found == methods.end()) {
         throw py::value_error(
@@ -178,16 +189,17 @@ ol::Evaluator::Method toMethod(const std::string& mode) {
     return found->second;
 }
 
-ol::Evaluator::Outside toOutside(bool extrapolates) {
-    return extrapolates ? ol::Evaluator::Outside::Extrapolate : ol::Evaluator::Outside::Clamp;
+ol::Evaluator::Outside toOutside(const py::object& extrapolate) {
+    return expect<bool>("extrapolate", "a bool", extrapolate) ? ol::Evaluator::Outside::Extrapolate
+                                                              : ol::Evaluator::Outside::Clamp;
 }
 
-py::object evaluate(const Table& table, const py::object& colours, const std::string& mode,
-                    bool extrapolates) {
+py::object evaluate(const Table& table, const py::object& colours, const py::object& mode,
+                    const py::object& extrapolate) {
     const py::array given = toNumbers(colours, "colours");
     expectColours(given);
     // Made anew each time: samples may be written to between calls.
-    const ol::Evaluator evaluator(table.lut, toMethod(mode), toOutside(extrapolates));
+    const ol::Evaluator evaluator(table.lut, toMethod(mode), toOutside(extrapolate));
     const Floats in(given);
     py::array_t<float> out(shapeOf(given));
     const float* const from = in.data();

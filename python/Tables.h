@@ -46,13 +46,16 @@ pybind11::object shaperOf(const Table& table);
 /// A list of (line or None, text).
 pybind11::list remarksOf(const Table& table);
 
+/// What a caller says of the way through a table; as objects, since what the binding says of other
+/// types shows all arguments, images too.
+/// @throws pybind11::type_error   no str, no bool
 /// @throws pybind11::value_error  no such method
-Orlith::LUT::Evaluator::Method toMethod(const std::string& mode);
-Orlith::LUT::Evaluator::Outside toOutside(bool extrapolates);
+Orlith::LUT::Evaluator::Method toMethod(const pybind11::object& mode);
+Orlith::LUT::Evaluator::Outside toOutside(const pybind11::object& extrapolate);
 
 /// Sends colours (..., 3) through a table; other threads of Python run meanwhile.
 pybind11::object evaluate(const Table& table, const pybind11::object& colours,
-                          const std::string& mode, bool extrapolates);
+                          const pybind11::object& mode, const pybind11::object& extrapolate);
 
 }  // namespace python
 

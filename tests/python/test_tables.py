@@ -216,6 +216,8 @@ BAD = {
     "last axis": (lambda: TABLE(np.zeros((3, 4))), ValueError, r"\(3, 4\)"),
     "no axis": (lambda: TABLE(np.float32(1)), ValueError, r"shape \(\)"),
     "mode": (lambda: TABLE(np.zeros(3), mode="linear"), ValueError, 'not "linear"'),
+    "no mode": (lambda: TABLE(places(), mode=None), TypeError, "^mode has to be a str, not NoneT"),
+    "no flag": (lambda: TABLE(places(), extrapolate="no"), TypeError, "^extrapolate .* not str$"),
     "three axes": (lambda: orlith.Table(np.zeros((2, 2, 3))), ValueError, r"\(2, 2, 3\)"),
     "four channels": (lambda: orlith.Table(np.zeros((2, 2, 2, 4))), ValueError, "R, G, B, 3"),
     "one point": (lambda: orlith.Table(np.zeros((2, 1, 2, 3))), ValueError, "two points"),
