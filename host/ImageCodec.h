@@ -84,7 +84,10 @@ struct ImageCopy {
     std::string to;          ///< another file; its extension names the format
     ImageChoice choice;      ///< whose colours change
     std::string sampleType;  ///< one of kSampleTypes; empty: as it is, or the nearest held
-    int threadCount = 0;     ///< 0: as many as there are processors
+    /// Divides colours by alpha before they change, and multiplies them behind it, where the file
+    /// has them multiplied and alpha is not 0.
+    bool unpremultiplies = false;
+    int threadCount = 0;  ///< 0: as many as there are processors
     Change change;
     /// Told again and again how much is done, up to 1. What it throws ends the copy.
     std::function<void(double done)> progress;
@@ -95,6 +98,7 @@ struct CopiedImage {
     int width = 0;  // of the part whose colours have changed
     int height = 0;
     std::string sampleType;           ///< of its colours
+    bool isPremultiplied = false;     ///< they were multiplied by an alpha
     std::string remark;               ///< as ImageReader::remark
     std::vector<std::string> losses;  ///< what the target's format does not hold, in a line each,
                                       ///< such as: holds no channel Z; left out

@@ -77,7 +77,7 @@ public:
 
 private:
     void copyImage(const PlannedImage& image) {
-        const PixelCopy copyPixels(image, copy_.change);
+        const PixelCopy copyPixels(image, copy_);
         const auto width = static_cast<std::size_t>(image.from.width);
         const int bandLines = std::min(
             bandLinesOf(image.from,
@@ -137,6 +137,7 @@ private:
         copied.width = changed->to.width;
         copied.height = changed->to.height;
         copied.sampleType = nameOf(sampleTypeOf(changed->to, changed->rgbTo[0]));
+        copied.isPremultiplied = changed->isPremultiplied;
         copied.remark = plan_.remark;
         copied.losses = target_.losses();
         return copied;

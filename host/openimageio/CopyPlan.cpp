@@ -54,8 +54,10 @@ void placeWindow(OIIO::ImageSpec& spec, CopyTarget& target) {
 
 /// Alpha as the format has it. Colours that are not multiplied by it are in OpenEXR files.
 void placeAlpha(PlannedImage& image, CopyTarget& target) {
+    const bool isUnassociated = image.from.get_int_attribute("oiio:UnassociatedAlpha") != 0;
+    image.isPremultiplied = image.alpha >= 0 && !isUnassociated;
     const bool isOpenEXR = std::string_view(target.formatName()) == "openexr";
-    if (!isOpenEXR || image.to.get_int_attribute("oiio:UnassociatedAlpha") == 0) return;
+    if (!isOpenEXR || !isUnassociated) return;
     image.to.erase_attribute("oiio:UnassociatedAlpha");
     if (image.alpha < 0) return;
     image.isAssociated = true;

@@ -21,7 +21,8 @@ struct PlannedImage {
     std::array<int, 3> rgb = {};    // of that part
     std::array<int, 3> rgbTo = {};  // their places among those written
     int alpha = -1;                 // that goes with them; -1: none
-    bool isAssociated = false;      // the colours are to be multiplied by it
+    bool isPremultiplied = false;   // the colours are multiplied by it
+    bool isAssociated = false;      // they are to be
 };
 
 struct CopyPlan {

@@ -40,15 +40,17 @@ PixelCopy::Layout::Layout(const OIIO::ImageSpec& spec) {
     }
 }
 
-PixelCopy::PixelCopy(const PlannedImage& image, const ImageCopy::Change& change)
+PixelCopy::PixelCopy(const PlannedImage& image, const ImageCopy& copy)
     : from_(image.from),
       to_(image.to),
       channels_(image.channels),
       isChanged_(image.isChanged),
       rgb_(image.rgb),
       rgbTo_(image.rgbTo),
-      associatingAlpha_(image.isAssociated ? image.alpha : -1),
-      change_(change),
+      alpha_(image.alpha),
+      isDivided_(image.isPremultiplied && copy.unpremultiplies),
+      isMultiplied_(isDivided_ || image.isAssociated),
+      change_(copy.change),
       isInPlace_(from_.channels.size() == to_.channels.size() &&
                  std::is_sorted(channels_.begin(), channels_.end()) &&
                  std::equal(from_.channels.begin(), from_.channels.end(), to_.channels.begin(),
@@ -89,12 +91,21 @@ void PixelCopy::changeColours(const std::byte* from, std::byte* to, std::size_t 
         for (std::size_t i = 0; i < pixelCount; ++i)
             rgb[3 * i + c] = plane[i];
     }
-    change_(rgb.data(), pixelCount);
-    if (associatingAlpha_ >= 0) {
-        readPlane(from_.channels[static_cast<std::size_t>(associatingAlpha_)], from, plane.data(),
-                  pixelCount);
+    std::array<float, kRunPixels> alpha;
+    if (isMultiplied_) {
+        readPlane(from_.channels[static_cast<std::size_t>(alpha_)], from, alpha.data(), pixelCount);
+    }
+    if (isDivided_) {
+        // Light without cover, such as a flame's, stays as it is.
+        std::replace(alpha.begin(), alpha.begin() + static_cast<std::ptrdiff_t>(pixelCount), 0.0F,
+                     1.0F);
         for (std::size_t i = 0; i < 3 * pixelCount; ++i)
-            rgb[i] *= plane[i / 3];
+            rgb[i] /= alpha[i / 3];
+    }
+    change_(rgb.data(), pixelCount);
+    if (isMultiplied_) {
+        for (std::size_t i = 0; i < 3 * pixelCount; ++i)
+            rgb[i] *= alpha[i / 3];
     }
     for (std::size_t c = 0; c < 3; ++c) {
         for (std::size_t i = 0; i < pixelCount; ++i)

@@ -13,8 +13,8 @@ namespace host::openimageio {
 /// type. What does not change is copied bit for bit where its type stays.
 class PixelCopy {
 public:
-    /// @param change  of the colours; kept by reference
-    PixelCopy(const PlannedImage& image, const ImageCopy::Change& change);
+    /// @param copy  kept by reference
+    PixelCopy(const PlannedImage& image, const ImageCopy& copy);
 
     std::size_t readPixelBytes() const { return from_.pixelBytes; }
     std::size_t writtenPixelBytes() const { return to_.pixelBytes; }
@@ -50,7 +50,9 @@ private:
     const bool isChanged_;
     const std::array<int, 3> rgb_;
     const std::array<int, 3> rgbTo_;
-    const int associatingAlpha_;  // -1: none
+    const int alpha_;
+    const bool isDivided_;     // by alpha, before the colours change
+    const bool isMultiplied_;  // by it, behind that
     const ImageCopy::Change& change_;
     const bool isInPlace_;
 };

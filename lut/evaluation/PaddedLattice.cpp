@@ -44,11 +44,11 @@ PaddedLattice::PaddedLattice(const Lattice& lattice, Layout layout) {
     float* place = floats_.get();
     for (int b = -kBelow; b <= lattice.last(2) + kAbove; ++b) {
         for (int r = -kBelow; r <= lattice.last(0) + kAbove; ++r) {
+            auto next = along.begin();
             for (int g = -kBelow; g <= lattice.last(1) + kAbove; ++g) {
-                along[static_cast<std::size_t>(g + kBelow)] =
-                    inLines ? extrapolatedSample(lattice, r, g, b)
-                            : RGB(lattice.sample(lattice.clamp(0, r), lattice.clamp(1, g),
-                                                 lattice.clamp(2, b)));
+                *next++ = inLines ? extrapolatedSample(lattice, r, g, b)
+                                  : RGB(lattice.sample(lattice.clamp(0, r), lattice.clamp(1, g),
+                                                       lattice.clamp(2, b)));
             }
             for (std::size_t i = 0; i < units; ++i, place += unit) {
                 const RGB* const first = &along[inLines ? 2 * i : i];

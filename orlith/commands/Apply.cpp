@@ -38,6 +38,7 @@ struct ApplyOptions {
     host::ImageChoice choice;
     std::string sampleType;
     std::optional<Frames> frames;
+    bool unpremultiplies = false;
     int threadCount = 0;
     bool isQuiet = false;
 };
@@ -149,6 +150,7 @@ private:
         copy.to = output.stagedPath();
         copy.choice = options_.choice;
         copy.sampleType = options_.sampleType;
+        copy.unpremultiplies = options_.unpremultiplies;
         copy.threadCount = options_.threadCount;
         copy.change = [this](float* rgb, std::size_t colourCount) {
             for (const auto& each : tables_)
@@ -180,6 +182,9 @@ private:
         }
         for (const std::string& loss : copied.losses)
             warnOnce(output.name(), loss);
+        if (options_.unpremultiplies && !copied.isPremultiplied) {
+            warnOnce(image, "its colours are not multiplied by alpha, and not divided by it");
+        }
         warnOfColoursOutside(image, copied);
         if (options_.isQuiet) return;
         progress_.clear();
@@ -273,6 +278,8 @@ void addApply(CLI::App& program, int& status) {
     addInteger(*command, "--threads", 1, kMostThreads,
                "Threads that share an image; if not given, one for each processor",
                [options](int count) { options->threadCount = count; });
+    command->add_flag("--unpremultiply", options->unpremultiplies,
+                      "Divide colours by alpha before the tables, and multiply them behind");
     command->add_flag("--quiet", options->isQuiet, "Do not say what was written");
     command->callback([options, &status] { status = runApply(*options); });
 }

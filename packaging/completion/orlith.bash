@@ -18,7 +18,7 @@ _orlith()
     local -A options=(
         [pattern]='--size --type --quiet'
         [generate]="--file-type --lut1d --style1d $codes --knob --force $image $written"
-        [apply]="--lut --type --frames --threads --quiet $reading $colours $image"
+        [apply]="--lut --type --frames --threads --unpremultiply --quiet $reading $colours $image"
         [bake]="--lut --size --image-type --force --to $reading $colours $writing $written"
         [convert]="--to --size $reading $writing $written"
         [info]="--json --values $reading"

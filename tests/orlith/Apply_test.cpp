@@ -223,6 +223,34 @@ TEST_F(ApplyTest, ChangesColoursAndKeepsTheRest) {
     EXPECT_EQ(Picture(folder_.path("alpha.png")).bytes, before.bytes);
 }
 
+TEST_F(ApplyTest, DividesByAlphaIfTold) {
+    // Colours of 0.25 behind alpha: 0.25 becomes 0.75; what has none is 0.25 itself.
+    folder_.write("curve.cube", "LUT_1D_SIZE 5\n0 0 0\n.75 .75 .75\n.8 .8 .8\n.9 .9 .9\n1 1 1\n");
+    const std::array<float, 4> alphas = {0.0F, 0.25F, 0.5F, 1.0F};
+    OIIO::ImageSpec spec(4, 1, 4, OIIO::TypeFloat);
+    spec.channelnames = {"R", "G", "B", "A"};
+    spec.alpha_channel = 3;
+    std::vector<float> samples;
+    for (const float alpha : alphas) {
+        const float colour = alpha == 0.0F ? 0.25F : 0.25F * alpha;
+        samples.insert(samples.end(), {colour, colour, colour, alpha});
+    }
+    const auto writer = OIIO::ImageOutput::create(folder_.path("edge.exr"));
+    ASSERT_TRUE(writer->open(folder_.path("edge.exr"), spec) &&
+                writer->write_image(OIIO::TypeFloat, samples.data()) && writer->close());
+    expect("apply edge.exr out.exr --lut curve.cube --unpremultiply --quiet", 0, "", "");
+    const Picture after(folder_.path("out.exr"));
+    for (std::size_t i = 0; i < alphas.size(); ++i) {
+        EXPECT_FLOAT_EQ(after.samples[4 * i], alphas[i] == 0.0F ? 0.75F : 0.75F * alphas[i]);
+        EXPECT_EQ(after.samples[4 * i + 3], alphas[i]);
+    }
+    write("plain.png", {specOf({"R", "G", "B"}, "uint8")});
+    expect(
+        "apply plain.png out.png --lut curve.cube --unpremultiply --quiet", 0, "",
+        "orlith: warning: plain.png: its colours are not multiplied by alpha, and not divided by "
+        "it\n");
+}
+
 TEST_F(ApplyTest, OfSeveralPartsOneChanges) {
     OIIO::ImageSpec depth = specOf({"Z"}, "float");
     OIIO::ImageSpec beauty = specOf({"R", "G", "B", "A"}, "half");
