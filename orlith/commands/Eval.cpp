@@ -47,17 +47,13 @@ void evaluate(const ColourWay& way, std::vector<float>& colours) {
     colours.clear();
 }
 
-/// "0,5 0,25 1,0": three words, each with a comma between digits. Others stand between numbers.
+/// "0,5 0,25 1": three words, and no comma but within a number. Others stand between numbers.
 bool hasDecimalCommas(std::string_view line) {
     const ol::Tokens words(line);
-    if (words.count() != 3) return false;
-    for (unsigned c = 0; c < 3; ++c) {
-        const std::size_t comma = words[c].find(',');
-        if (comma == 0 || comma == std::string_view::npos || comma + 1 == words[c].size() ||
-            words[c].find(',', comma + 1) != std::string_view::npos)
-            return false;
-    }
-    return true;
+    const auto isNumber = [&](unsigned c) {
+        return words[c].find(',') == std::string_view::npos || ol::hasDecimalComma(words[c]);
+    };
+    return words.count() == 3 && isNumber(0) && isNumber(1) && isNumber(2);
 }
 
 /// Takes the line's colour, if it has one.

@@ -122,7 +122,7 @@ TEST_F(InspectTest, EvalSendsColoursThroughATable) {
         {"eval a.cube nan inf -inf", 0, "1 0 0.5\n", ""},
         {"eval a.cube -.5 1 -nan", 0, "1 0 0.5\n", ""},
         {"eval a.cube 1 1 0x1", 2, "", "orlith: error: \"1 1 0x1\" is not three numbers\n"},
-        {"eval a.cube 0,25 1,0 0,0", 0, "1 0.25 0.5\n", ""},
+        {"eval a.cube 0,25 1,0 0", 0, "1 0.25 0.5\n", ""},
         {"eval a.cube 0.25 1 0", 0, "1 0.25 0.5\n", ""},
         {"eval a.cube 0.25,1,0", 0, "1 0.25 0.5\n", ""},
     });

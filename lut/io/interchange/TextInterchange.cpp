@@ -32,15 +32,6 @@ bool isNumber(std::string_view word) {
     return result.ec != std::errc::invalid_argument && result.ptr == end;
 }
 
-/// "0,5": digits, one comma, digits, perhaps with a sign.
-bool hasDecimalComma(std::string_view word) {
-    if (!word.empty() && (word[0] == '-' || word[0] == '+')) word.remove_prefix(1);
-    const std::size_t comma = word.find(',');
-    if (comma == std::string_view::npos || comma == 0 || comma + 1 == word.size()) return false;
-    return std::all_of(word.begin(), word.end(), [](char c) { return isDigit(c) || c == ','; }) &&
-           word.find(',', comma + 1) == std::string_view::npos;
-}
-
 /// Whether the first word of a line begins with a letter and is no number, as "inf" is.
 bool beginsWithAWord(std::string_view line) {
     std::string_view word;

@@ -148,6 +148,14 @@ std::int32_t toInt(std::string_view token) {
     return static_cast<std::int32_t>(number);
 }
 
+bool hasDecimalComma(std::string_view word) {
+    if (!word.empty() && (word[0] == '-' || word[0] == '+')) word.remove_prefix(1);
+    const std::size_t comma = word.find(',');
+    if (comma == std::string_view::npos || comma == 0 || comma + 1 == word.size()) return false;
+    return std::all_of(word.begin(), word.end(), [](char c) { return isDigit(c) || c == ','; }) &&
+           word.find(',', comma + 1) == std::string_view::npos;
+}
+
 bool parsePlainTriple(std::string_view line, RGB& rgb) {
     Rest rest{line.data(), line.data() + line.size(), line.data()};
     float numbers[3];

@@ -17,6 +17,9 @@ float toFloat(std::string_view token);
 /// As strtol in base 10, cut to 32 bits.
 std::int32_t toInt(std::string_view token);
 
+/// Whether a word is digits, a comma and digits, perhaps behind a sign: "0,5" for 0.5.
+bool hasDecimalComma(std::string_view word);
+
 /// Reads a line of three plain decimals ("0.5 -12 .25"), separated by blanks and tabs; the result
 /// is that of toFloat on each. This is the quick way for the data lines of every text format.
 /// @param line  may end in a carriage return
